@@ -1,0 +1,154 @@
+// From the bytes of a large feed to the incidents of ten lines, beside a full decode of the same
+// bytes by generated code: both in turn in every iteration, so that they have the same machine.
+
+#include "platform/feeds/alerts/IncidentBuilder.h"
+
+#include <benchmark/benchmark.h>
+
+#include <algorithm>
+#include <cstdlib>
+#include <ctime>
+#include <fstream>
+#include <gtfs_realtime.pb.h>
+#include <iterator>
+#include <malloc.h>
+#include <new>
+#include <string>
+
+namespace {
+
+/// Bytes that were taken from the heap and not given back, now and at most, while counting.
+bool counting = false; // one thread only
+std::ptrdiff_t live = 0;
+std::ptrdiff_t peak = 0;
+
+} // namespace
+
+void* operator new(std::size_t size) {
+    void* const block = std::malloc(size);
+    if (!block)
+        throw std::bad_alloc();
+    if (counting) {
+        live += static_cast<std::ptrdiff_t>(malloc_usable_size(block));
+        peak = std::max(peak, live);
+    }
+    return block;
+}
+void operator delete(void* block) noexcept {
+    if (counting && block)
+        live -= static_cast<std::ptrdiff_t>(malloc_usable_size(block));
+    std::free(block);
+}
+void operator delete(void* block, std::size_t) noexcept {
+    operator delete(block);
+}
+
+namespace {
+
+using namespace orvo;
+
+/// The heap keeps its pages from one iteration to the next, for both sides alike: how dear a fresh
+/// page is depends on the machine more than on the code.
+const bool keepsPages =
+    mallopt(M_TRIM_THRESHOLD, 1 << 30) != 0 && mallopt(M_MMAP_THRESHOLD, 1 << 30) != 0;
+
+constexpr double Now = 1750000000; // the capture's own time
+constexpr int Routes = 2000;
+
+std::shared_ptr<NSData> feedBytes() {
+    const char* const folder = std::getenv("ORVO_TEST_FEEDS");
+    std::ifstream file(std::string(folder ? folder : "../shared/data") + "/perf/alerts-5000.pb",
+                       std::ios::binary);
+    return NSData::dataWithString(std::string(std::istreambuf_iterator<char>(file), {}));
+}
+
+std::shared_ptr<const LineIndex> makeIndex() {
+    LineIndex::Contents contents;
+    contents.feed = "perf";
+    contents.timezone = "Europe/Paris";
+    for (int i = 0; i < Routes; ++i) {
+        ScheduleLine line;
+        line.feed = "perf";
+        line.routeId = "R" + std::to_string(i);
+        line.muid = lineMuid(line.feed, line.routeId);
+        line.agencyId = "A1";
+        line.shortName = std::to_string(i);
+        line.longName = "Line " + line.shortName;
+        line.order = i;
+        line.agency = {"A1", "Perf Agency", "", "Europe/Paris", ""};
+        contents.lines.push_back(line);
+    }
+    return std::make_shared<LineIndex>(std::move(contents));
+}
+
+/// Processor time: other programs on the machine do not count.
+double processorSeconds() {
+    timespec time{};
+    clock_gettime(CLOCK_THREAD_CPUTIME_ID, &time);
+    return static_cast<double>(time.tv_sec) + static_cast<double>(time.tv_nsec) * 1e-9;
+}
+
+template <class Work>
+double secondsOf(const Work& work) {
+    const double begin = processorSeconds();
+    work();
+    return processorSeconds() - begin;
+}
+
+/// The yardstick, without the time to throw the message away.
+double secondsOfDecoding(benchmark::State& state, const NSData& bytes) {
+    transit_realtime::FeedMessage message;
+    return secondsOf([&] {
+        if (!message.ParseFromArray(bytes.bytes().data(), static_cast<int>(bytes.length())))
+            state.SkipWithError("the yardstick cannot read the feed");
+    });
+}
+
+void build(benchmark::State& state, const IncidentQuery& query) {
+    const auto bytes = feedBytes();
+    if (bytes->length() == 0)
+        return state.SkipWithError("ORVO_TEST_FEEDS does not name the captured feeds");
+    if (!keepsPages)
+        return state.SkipWithError("the heap cannot be told to keep its pages");
+    const IncidentBuilder builder(makeIndex());
+    const std::vector<AlertSource> sources = {{bytes, Now, nullptr}};
+    double decoding = 0;
+    double building = 0;
+    live = peak = 0;
+    counting = true;
+    const FeedIncidents counted = builder.build(sources, query);
+    counting = false;
+    for (auto _ : state) {
+        decoding += secondsOfDecoding(state, *bytes);
+        FeedIncidents answer;
+        const double once = secondsOf([&] { answer = builder.build(sources, query); });
+        building += once;
+        state.SetIterationTime(once);
+    }
+    std::size_t incidents = 0;
+    for (const LineIncidents& line : counted.lines)
+        incidents += line.incidents.size();
+    state.counters["decode_ms"] = decoding * 1e3 / static_cast<double>(state.iterations());
+    state.counters["share_of_decode"] = building / decoding;
+    state.counters["peak_in_feeds"] =
+        1 + static_cast<double>(peak) / static_cast<double>(bytes->length());
+    state.counters["incidents"] = static_cast<double>(incidents);
+}
+
+/// Ten lines, each so many places behind the one before.
+void tenLines(benchmark::State& state) {
+    IncidentQuery query{std::vector<std::uint64_t>(), Now, "en", false};
+    for (int i = 0; i < 10; ++i)
+        query.lines->push_back(lineMuid("perf", "R" + std::to_string(i * state.range(0))));
+    build(state, query);
+}
+
+void allLines(benchmark::State& state) {
+    build(state, {std::nullopt, Now, "en", false});
+}
+
+BENCHMARK(tenLines)->ArgName("apart")->Arg(1)->Arg(200)->UseManualTime()->Unit(
+    benchmark::kMillisecond);
+BENCHMARK(allLines)->UseManualTime()->Unit(benchmark::kMillisecond);
+
+} // namespace

@@ -1,0 +1,110 @@
+#include "orvo/FeedsListCommand.h"
+
+#include "orvo/FeedChoice.h"
+#include "orvo/JsonParts.h"
+#include "orvo/console/PeriodText.h"
+#include "orvo/console/TextTable.h"
+
+#include <fmt/format.h>
+#include <ostream>
+
+namespace orvo {
+
+namespace {
+
+/// Nothing where the schedule does not say.
+std::optional<std::string> textOrNull(const std::optional<ScheduleInfo>& info,
+                                      std::string ScheduleInfo::*member) {
+    return info && !((*info).*member).empty() ? std::optional((*info).*member) : std::nullopt;
+}
+
+std::string json(const FeedChoice& choice, const ScheduleStore* schedules, double now) {
+    JsonWriter json;
+    json.beginObject().key("feeds").beginArray();
+    for (const auto& feed : choice.feeds) {
+        const auto info = schedules ? schedules->info(feed.name) : std::nullopt;
+        json.beginObject();
+        json.key("name").value(feed.name);
+        json.key("lines").value(info ? info->lines : 0);
+        json.key("agencies").value(info ? info->agencies : 0);
+        json.key("version").value(textOrNull(info, &ScheduleInfo::version));
+        json.key("start_date").value(textOrNull(info, &ScheduleInfo::startDate));
+        json.key("end_date").value(textOrNull(info, &ScheduleInfo::endDate));
+        json.key("run_out").value(info && info->hasRunOut(now));
+        JsonParts::addTime(json, "imported", info ? std::optional(info->importedAt) : std::nullopt);
+        JsonParts::addTime(json, "checked", feed.lastScheduleCheck);
+        json.key("static").value(feed.schedule.displayLocation());
+        json.key("alerts").beginArray();
+        for (const auto& source : feed.alerts)
+            json.value(source.displayLocation());
+        json.endArray().endObject();
+    }
+    json.endArray();
+    JsonParts::addError(json, choice.error);
+    return json.endObject().text();
+}
+
+std::string validity(const std::optional<ScheduleInfo>& info, double now) {
+    if (!info)
+        return "no schedule";
+    if (info->hasRunOut(now))
+        return "ran out on " + info->endDate;
+    return info->endDate.empty() ? "open" : "until " + info->endDate;
+}
+
+std::string checked(const FeedConfiguration& feed, double now) {
+    if (!feed.lastScheduleCheck)
+        return "never";
+    return PeriodText::age(now - *feed.lastScheduleCheck) + " ago";
+}
+
+} // namespace
+
+CommandSpec FeedsListCommand::spec() const {
+    return {.path = {"feeds", "list"},
+            .summary = "List the feeds",
+            .description = "With their schedules, how long those are valid, when a newer one was "
+                           "last asked for, and where the alerts come from.",
+            .options = {{"json", "", "print JSON"}},
+            .examples = {{"orvo feeds list", "all feeds"}}};
+}
+
+ExitCode FeedsListCommand::run(const Arguments& arguments, CommandContext& context) {
+    auto choice = FeedChoice::of({}, context);
+    std::shared_ptr<NSError> storeError;
+    const auto schedules = context.schedules(storeError);
+    if (!choice.error)
+        choice.error = storeError;
+    const double now = context.now();
+    if (arguments.has("json"))
+        context.terminal().output() << json(choice, schedules.get(), now);
+    if (choice.error)
+        return context.fail(*choice.error);
+    if (arguments.has("json"))
+        return ExitCode::Answered;
+    if (choice.feeds.empty())
+        context.terminal().note("No feeds yet. Add one with: orvo feeds add");
+    TextTable table({{"Feed", TextTable::Column::Alignment::Left, false},
+                     {"Lines", TextTable::Column::Alignment::Right, false},
+                     {"Schedule", TextTable::Column::Alignment::Left, false},
+                     {"Checked", TextTable::Column::Alignment::Left, false},
+                     {"Static"},
+                     {"Alerts"}});
+    for (const auto& feed : choice.feeds) {
+        const auto info = schedules->info(feed.name);
+        std::string alerts;
+        for (const auto& source : feed.alerts)
+            alerts += (alerts.empty() ? "" : " ") + source.displayLocation();
+        table.addRow({feed.name,
+                      fmt::format("{}", info ? info->lines : 0),
+                      validity(info, now),
+                      checked(feed, now),
+                      feed.schedule.displayLocation(),
+                      alerts});
+    }
+    if (!table.isEmpty())
+        table.print(context.terminal());
+    return ExitCode::Answered;
+}
+
+} // namespace orvo

@@ -1,0 +1,29 @@
+#pragma once
+
+#include "orvo/CommandContext.h"
+#include "orvo/HandOff.h"
+
+namespace orvo {
+
+/// Takes what is handed over: reads it, keeps it as the last one of the profile in use, and tells
+/// it.
+namespace HandOffReceiver {
+
+/// The map application's name on the bus and of its desktop file.
+inline constexpr const char* ApplicationIdentifier = "com.zentu.Orvo";
+
+enum class Audience { Terminal, Nobody };
+
+/// Keeps it, and tells it to the terminal unless nobody looks. Nil, or why not; what cannot be read
+/// is neither kept nor told.
+[[nodiscard]] std::shared_ptr<NSError>
+take(const HandOff& handOff, CommandContext& context, Audience audience);
+
+/// For a command that a person, or a program without a bus, gave: the instance that serves the
+/// application, where there is one, takes it too, and then keeps it in this one's place. What went
+/// wrong is said on the terminal.
+[[nodiscard]] ExitCode takeForCommand(const HandOff& handOff, CommandContext& context);
+
+} // namespace HandOffReceiver
+
+} // namespace orvo

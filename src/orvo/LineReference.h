@@ -1,0 +1,27 @@
+#pragma once
+
+#include "platform/feeds/schedule/ScheduleStore.h"
+
+#include <optional>
+#include <string>
+#include <string_view>
+
+namespace orvo {
+
+/// How a person names a line: `FEED:ROUTE_ID`, or a short or long name that only one line has.
+namespace LineReference {
+
+struct Answer {
+    std::optional<ScheduleLine> line;
+    std::string message; ///< why there is no line, without a full stop
+    std::string cure;    ///< what to do, a sentence
+};
+
+[[nodiscard]] Answer resolve(const ScheduleStore& schedules, const std::string& text);
+
+/// `FEED:ROUTE_ID` of a line.
+[[nodiscard]] std::string nameOf(std::string_view feed, std::string_view routeId);
+
+} // namespace LineReference
+
+} // namespace orvo

@@ -1,0 +1,42 @@
+#include "orvo/ShowCommand.h"
+
+#include "orvo/HandOffPrinter.h"
+#include "orvo/HandOffStore.h"
+#include "orvo/console/PeriodText.h"
+
+#include <algorithm>
+#include <fmt/format.h>
+
+namespace orvo {
+
+CommandSpec ShowCommand::spec() const {
+    return {.path = {"show"},
+            .summary = "Show what was handed over last",
+            .description =
+                "What a tap in the widget opened, or a URL: a line with its incidents in full, a "
+                "list of incidents, or the favourites.",
+            .examples = {{"orvo show", "the last one"},
+                         {"orvo show --demo", "of the demonstration city"}}};
+}
+
+ExitCode ShowCommand::run(const Arguments&, CommandContext& context) {
+    std::shared_ptr<NSError> error;
+    const auto kept = HandOffStore::last(&error);
+    if (error)
+        return context.fail(*error);
+    if (!kept) {
+        context.terminal().note(
+            "Nothing has been handed over yet. Tap a row of the widget, or: orvo open URL");
+        return ExitCode::Answered;
+    }
+    const auto content = kept->handOff.content(&error);
+    if (!content)
+        return context.fail(*error);
+    if ((error = HandOffPrinter(context).print(*content)))
+        return context.fail(*error);
+    context.terminal().note(fmt::format(
+        "Handed over {} ago.", PeriodText::age(std::max(0.0, context.now() - kept->receivedAt))));
+    return ExitCode::Answered;
+}
+
+} // namespace orvo

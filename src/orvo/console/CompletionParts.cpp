@@ -1,0 +1,55 @@
+#include "orvo/console/CompletionParts.h"
+
+namespace orvo::Completion {
+
+const char* machineWords(Completes what) {
+    switch (what) {
+    case Completes::Feed:
+        return "feeds";
+    case Completes::Line:
+        return "lines";
+    case Completes::Favorite:
+        return "favorites";
+    case Completes::Nothing:
+    case Completes::File:
+    case Completes::Word:
+        break;
+    }
+    return nullptr;
+}
+
+std::vector<OptionSpec> optionsOf(const CommandSpec& command) {
+    auto options = command.options;
+    options.insert(options.end(), globalOptions().begin(), globalOptions().end());
+    return options;
+}
+
+std::vector<std::pair<std::string, std::string>> wordsAfter(const ProgramSpec& program,
+                                                            const std::vector<std::string>& path) {
+    std::vector<std::pair<std::string, std::string>> words;
+    for (const auto* command : program.commandsBelow(path)) {
+        const std::string& word = command->path[path.size()];
+        const bool isGroup = command->path.size() > path.size() + 1;
+        if (words.empty() || words.back().first != word)
+            words.emplace_back(word, isGroup ? word + " …" : command->summary);
+    }
+    return words;
+}
+
+std::set<std::vector<std::string>> groupsOf(const ProgramSpec& program) {
+    std::set<std::vector<std::string>> groups = {{}};
+    for (const auto& command : program.commands) {
+        auto path = command.path;
+        path.pop_back();
+        groups.insert(path);
+    }
+    return groups;
+}
+
+std::string quoted(std::string text) {
+    for (std::size_t at = 0; (at = text.find('\'', at)) != std::string::npos; at += 4)
+        text.replace(at, 1, "'\\''");
+    return "'" + text + "'";
+}
+
+} // namespace orvo::Completion

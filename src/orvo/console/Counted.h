@@ -1,0 +1,20 @@
+#pragma once
+
+#include <cstdint>
+#include <string>
+#include <string_view>
+
+namespace orvo {
+
+/// Numbers of things in words.
+namespace Counted {
+
+/// `1,234`.
+[[nodiscard]] std::string grouped(std::uint64_t number);
+/// `1 line`, `0 lines`, `1,234 lines`.
+[[nodiscard]] std::string
+text(std::uint64_t number, std::string_view singular, std::string_view plural);
+
+} // namespace Counted
+
+} // namespace orvo

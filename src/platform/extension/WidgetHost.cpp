@@ -1,0 +1,369 @@
+#include "platform/extension/WidgetHost.h"
+
+#include "platform/extension/WidgetPresenter.h"
+#include "platform/extension/WidgetUpdateSchedule.h"
+#include "platform/extension/_DisplayModeStore.h"
+#include "platform/extension/_TransitionBlocks.h"
+#include "platform/extension/_WidgetContext.h"
+#include "platform/foundation/DispatchQueue.h"
+#include "platform/uikit/UIFontDescriptor.h"
+#include "platform/uikit/UIViewController.h"
+#include "platform/uikit/table/UIScrollView.h"
+
+#include <algorithm>
+#include <cmath>
+#include <limits>
+
+namespace orvo {
+
+namespace {
+
+/// How many compact heights the expanded widget may have where no screen says it: five rows at
+/// every text size.
+constexpr double RowsWithoutScreen = 5.6;
+/// What a widget may unfold to while its height is found out.
+constexpr CGFloat Boundless = 10000;
+
+CGFloat compactHeightIn(UIContentSizeCategory category) {
+    const auto size = pointSizeOf(UIFontTextStyleBody, category);
+    const auto standard = pointSizeOf(UIFontTextStyleBody, UIContentSizeCategory::L);
+    return std::round(WidgetHost::CompactHeight * size / standard);
+}
+
+/// How far down the contents of a view reach, what could be scrolled to included.
+CGFloat contentHeightOf(const UIView& view) {
+    CGFloat bottom = 0;
+    for (const auto& subview : view.subviews()) {
+        const auto scrolling = std::dynamic_pointer_cast<UIScrollView>(subview);
+        const auto& frame = subview->frame();
+        const auto height = scrolling ? scrolling->contentSize().height : frame.size.height;
+        bottom = std::max(bottom, frame.origin.y + height);
+    }
+    return bottom;
+}
+
+std::shared_ptr<UIView> outermost(std::shared_ptr<UIView> view) {
+    while (const auto above = view->superview())
+        view = above;
+    return view;
+}
+
+} // namespace
+
+class WidgetHost::Hold {
+public:
+    explicit Hold(WidgetHost& host)
+        : _host(host) {
+        ++_host._holds;
+    }
+    Hold(const Hold&) = delete;
+    Hold& operator=(const Hold&) = delete;
+    ~Hold() { --_host._holds; }
+
+private:
+    WidgetHost& _host;
+};
+
+std::shared_ptr<WidgetHost>
+WidgetHost::hostWithExtension_settings(const Extension& extension,
+                                       const WidgetHostSettings& settings) {
+    auto host = std::make_shared<WidgetHost>();
+    host->_initWithExtension_settings(extension, settings);
+    return host;
+}
+
+WidgetHost::WidgetHost() = default;
+
+WidgetHost::~WidgetHost() {
+    if (!_controller)
+        return;
+    _context->setLargestModeTold({});
+    _controller->_setPreferredContentSizeChanged({});
+    if (_visible) {
+        _controller->viewWillDisappear(false);
+        _controller->viewDidDisappear(false);
+    }
+}
+
+void WidgetHost::_initWithExtension_settings(const Extension& extension,
+                                             const WidgetHostSettings& settings) {
+    const auto weak = std::weak_ptr<WidgetHost>(strong(this));
+    _extensionDescription = extension.description();
+    _settings = settings;
+    _chosenMode =
+        settings.mode.value_or(_DisplayModeStore::load(_extensionDescription.bundleIdentifier)
+                                   .value_or(NCWidgetDisplayMode::Compact));
+    _context = _WidgetContext::contextWithApplicationIdentifier(
+        _extensionDescription.containingApplication);
+    _context->setActiveMode(_chosenMode);
+    _context->setLargestModeTold([weak] {
+        if (const auto self = weak.lock())
+            self->largestModeWasTold();
+    });
+    updateMaxima(UITraitCollection::system().get().preferredContentSizeCategory);
+    _contentSize = _context->widgetMaximumSizeForDisplayMode(NCWidgetDisplayMode::Compact);
+    _schedule = WidgetUpdateSchedule::scheduleWithRequest([weak] {
+        if (const auto self = weak.lock())
+            self->requestUpdate();
+    });
+    _controller = extension.makePrincipalObject();
+    _controller->setExtensionContext(_context);
+    _controller->_setPreferredContentSizeChanged([weak](CGSize) {
+        if (const auto self = weak.lock()) {
+            self->_prefersHeight = true;
+            self->updateContentSize();
+        }
+    });
+}
+
+// What is shown
+
+const std::shared_ptr<UIView>& WidgetHost::view() {
+    if (!_controller->isViewLoaded())
+        loadView();
+    return _controller->view();
+}
+
+void WidgetHost::loadView() {
+    const Hold hold(*this);
+    // The controller makes its view and then reads its width, so that comes between the two.
+    _controller->loadView();
+    const auto view = _controller->view();
+    view->setDirectionalLayoutMargins({0, SideMargin, 0, SideMargin});
+    view->setFrame({{0, 0}, _contentSize});
+    _controller->viewDidLoad();
+    if (const auto widget = std::dynamic_pointer_cast<NCWidgetProviding>(_controller))
+        widget->widgetActiveDisplayModeDidChange_withMaximumSize(
+            displayMode(), maximumSizeForDisplayMode(displayMode()));
+    _contentSize.height = std::min(preferredHeight(), heightLimit());
+    view->setFrame({{0, 0}, _contentSize});
+}
+
+CGFloat WidgetHost::preferredHeight() const {
+    if (_prefersHeight)
+        return std::max<CGFloat>(_controller->preferredContentSize().height, 0);
+    return shownHeight();
+}
+
+CGFloat WidgetHost::shownHeight() const {
+    if (displayMode() == NCWidgetDisplayMode::Compact || !_controller->isViewLoaded())
+        return maximumSizeForDisplayMode(NCWidgetDisplayMode::Compact).height;
+    const auto view = _controller->view();
+    const auto frame = view->frame();
+    view->setFrame({frame.origin, {frame.size.width, std::min(heightLimit(), Boundless)}});
+    view->layoutIfNeeded();
+    const auto height = contentHeightOf(*view);
+    view->setFrame(frame);
+    return height;
+}
+
+CGFloat WidgetHost::heightLimit() const {
+    const auto free = _settings.freeHeight.value_or(std::numeric_limits<CGFloat>::infinity());
+    const auto maximum = maximumSizeForDisplayMode(displayMode()).height;
+    return maximum > 0 ? std::min(maximum, free) : free;
+}
+
+NCWidgetDisplayMode WidgetHost::displayMode() const {
+    return _context->widgetActiveDisplayMode();
+}
+
+bool WidgetHost::offersExpanded() const {
+    return _context->widgetLargestAvailableDisplayMode() == NCWidgetDisplayMode::Expanded;
+}
+
+CGSize WidgetHost::maximumSizeForDisplayMode(NCWidgetDisplayMode mode) const {
+    return _context->widgetMaximumSizeForDisplayMode(mode);
+}
+
+void WidgetHost::updateMaxima(UIContentSizeCategory category) {
+    const auto compact = compactHeightIn(category);
+    auto expanded = _settings.freeHeight.value_or(RowsWithoutScreen * compact);
+    if (_settings.maxRows)
+        expanded = static_cast<CGFloat>(*_settings.maxRows) * compact;
+    _context->setMaxima({_settings.width, compact}, {_settings.width, expanded});
+}
+
+void WidgetHost::updateContentSize() {
+    if (_holds > 0 || _modeWillSettle || !_controller->isViewLoaded())
+        return;
+    const CGSize size{_settings.width, std::min(preferredHeight(), heightLimit())};
+    if (size == _contentSize)
+        return;
+    _contentSize = size;
+    transitionTo(size);
+}
+
+void WidgetHost::transitionTo(CGSize size) {
+    const auto blocks = std::make_shared<_TransitionBlocks>();
+    _controller->viewWillTransitionToSize_withTransitionCoordinator(size, blocks);
+    const auto alongside = [blocks] {
+        blocks->runAnimations();
+    };
+    const auto completion = [blocks] {
+        blocks->runCompletions();
+    };
+    if (const auto presenter = _presenter.lock()) {
+        presenter->widgetHost_transitionToContentSize(*this, size, alongside, completion);
+        return;
+    }
+    const auto& view = _controller->view();
+    view->setFrame({view->frame().origin, size});
+    alongside();
+    completion();
+}
+
+// Modes
+
+void WidgetHost::setDisplayMode(NCWidgetDisplayMode mode) {
+    if (mode == NCWidgetDisplayMode::Expanded && !offersExpanded())
+        return;
+    _chosenMode = mode;
+    if (!_settings.mode)
+        _DisplayModeStore::save(_extensionDescription.bundleIdentifier, mode);
+    showMode(mode);
+}
+
+void WidgetHost::showMode(NCWidgetDisplayMode mode) {
+    if (mode == displayMode())
+        return;
+    {
+        const Hold hold(*this);
+        _context->setActiveMode(mode);
+        if (const auto widget = std::dynamic_pointer_cast<NCWidgetProviding>(_controller))
+            widget->widgetActiveDisplayModeDidChange_withMaximumSize(
+                mode, maximumSizeForDisplayMode(mode));
+    }
+    if (const auto presenter = _presenter.lock())
+        presenter->widgetHostDidChangeDisplayMode(*this);
+    updateContentSize();
+}
+
+NCWidgetDisplayMode WidgetHost::wantedMode() const {
+    return offersExpanded() ? _chosenMode : NCWidgetDisplayMode::Compact;
+}
+
+void WidgetHost::largestModeWasTold() {
+    const auto largest = _context->widgetLargestAvailableDisplayMode();
+    if (largest != _toldLargestMode) {
+        _toldLargestMode = largest;
+        if (const auto presenter = _presenter.lock())
+            presenter->widgetHostDidChangeDisplayMode(*this);
+    }
+    if (wantedMode() != displayMode() && !_modeWillSettle) {
+        _modeWillSettle = true;
+        DispatchQueue::mainQueue()->async([weak = std::weak_ptr<WidgetHost>(strong(this))] {
+            if (const auto self = weak.lock())
+                self->settleMode();
+        });
+    }
+    if (_contentTold)
+        _contentTold();
+    // A widget that suddenly has no more than one row to show may tell of a failure that nobody
+    // here asked for. Asking at this moment joins what has just ended, so that the failure is known
+    // and asked about again later.
+    if (largest == NCWidgetDisplayMode::Compact && _visible && _holds == 0 && _requestsRunning == 0)
+        requestUpdate();
+}
+
+void WidgetHost::settleMode() {
+    _modeWillSettle = false;
+    showMode(wantedMode());
+    updateContentSize();
+}
+
+// Life
+
+void WidgetHost::setShown(bool shown) {
+    _shown = shown;
+    updateVisibility();
+}
+
+void WidgetHost::setLocked(bool locked) {
+    _locked = locked;
+    updateVisibility();
+}
+
+void WidgetHost::updateVisibility() {
+    const bool visible = _shown && !_locked;
+    if (visible == _visible)
+        return;
+    _visible = visible;
+    if (!visible) {
+        _schedule->setVisible(false);
+        _controller->viewWillDisappear(false);
+        _controller->viewDidDisappear(false);
+        return;
+    }
+    static_cast<void>(view());
+    {
+        const Hold hold(*this);
+        _controller->viewWillAppear(false);
+        _controller->viewDidAppear(false);
+    }
+    updateContentSize();
+    _schedule->setVisible(true);
+}
+
+void WidgetHost::requestUpdate(NCWidgetProviding::UpdateHandler handler) {
+    const auto widget = std::dynamic_pointer_cast<NCWidgetProviding>(_controller);
+    if (!widget) {
+        DispatchQueue::mainQueue()->async([handler = std::move(handler)] {
+            if (handler)
+                handler(NCUpdateResult::NoData);
+        });
+        return;
+    }
+    ++_requestsRunning;
+    widget->widgetPerformUpdateWithCompletionHandler(
+        [weak = std::weak_ptr<WidgetHost>(strong(this)),
+         handler = std::move(handler)](NCUpdateResult result) {
+            if (const auto self = weak.lock()) {
+                --self->_requestsRunning;
+                self->_schedule->didAnswer(result != NCUpdateResult::Failed);
+            }
+            if (handler)
+                handler(result);
+        });
+}
+
+// What happens around it
+
+void WidgetHost::setWidth(CGFloat width) {
+    _settings.width = width;
+    updateMaxima(UITraitCollection::system().get().preferredContentSizeCategory);
+    updateContentSize();
+}
+
+void WidgetHost::setFreeHeight(std::optional<CGFloat> height) {
+    _settings.freeHeight = height;
+    updateMaxima(UITraitCollection::system().get().preferredContentSizeCategory);
+    updateContentSize();
+}
+
+void WidgetHost::setTraits(const UITraitCollection& traits) {
+    const auto previous = UITraitCollection::system().get();
+    if (traits == previous)
+        return;
+    {
+        const Hold hold(*this);
+        updateMaxima(traits.preferredContentSizeCategory);
+        UITraitCollection::setSystem(traits);
+        if (_controller->isViewLoaded())
+            outermost(_controller->view())->_traitsDidChange(previous);
+    }
+    updateContentSize();
+}
+
+void WidgetHost::machineDidWake() {
+    _schedule->somethingChanged();
+}
+
+void WidgetHost::networkDidChange() {
+    _schedule->somethingChanged();
+}
+
+void WidgetHost::didReceiveMemoryWarning() {
+    _controller->didReceiveMemoryWarning();
+}
+
+} // namespace orvo

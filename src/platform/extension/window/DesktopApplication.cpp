@@ -1,0 +1,54 @@
+#include "platform/extension/window/DesktopApplication.h"
+
+#include <QGuiApplication>
+
+#include <array>
+#include <cstdlib>
+#include <filesystem>
+
+namespace orvo {
+
+namespace {
+
+constexpr int KeepGiven = 0;
+
+bool isSet(const char* variable) {
+    const char* const value = std::getenv(variable);
+    return value && *value;
+}
+
+/// Without an address, and without the usual socket, the bus's library would start a bus by itself.
+void nameNoBusWhereThereIsNone() {
+    if (isSet("DBUS_SESSION_BUS_ADDRESS"))
+        return;
+    std::error_code unreadable;
+    const char* const runtime = std::getenv("XDG_RUNTIME_DIR");
+    if (!runtime || !std::filesystem::exists(std::filesystem::path(runtime) / "bus", unreadable))
+        setenv("DBUS_SESSION_BUS_ADDRESS", "disabled:", KeepGiven);
+}
+
+} // namespace
+
+bool haveDisplay() {
+    return isSet("WAYLAND_DISPLAY") || isSet("DISPLAY") || isSet("QT_QPA_PLATFORM");
+}
+
+void makeDesktopApplication(const std::string& desktopFile) {
+    if (QCoreApplication::instance())
+        return;
+    static std::string name = "orvo-transit-widget";
+    static std::array<char*, 2> words = {name.data(), nullptr};
+    static int count = 1;
+    nameNoBusWhereThereIsNone();
+    // A card is pixels: no graphics driver has to be loaded for it, nor a theme of the desktop's.
+    setenv("QT_WAYLAND_CLIENT_BUFFER_INTEGRATION", "none", KeepGiven);
+    setenv("QT_XCB_GL_INTEGRATION", "none", KeepGiven);
+    QGuiApplication::setDesktopSettingsAware(false);
+    QGuiApplication::setDesktopFileName(
+        QString::fromUtf8(desktopFile.data(), static_cast<qsizetype>(desktopFile.size())));
+    // Never destroyed: it would go after what it stands on.
+    auto* const application = new QGuiApplication(count, words.data());
+    application->setQuitOnLastWindowClosed(false);
+}
+
+} // namespace orvo

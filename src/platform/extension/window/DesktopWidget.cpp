@@ -1,0 +1,65 @@
+#include "platform/extension/window/DesktopWidget.h"
+
+#include "platform/extension/window/WidgetWindow.h"
+#include "platform/foundation/DispatchQueue.h"
+#include "platform/foundation/RunLoop.h"
+
+namespace orvo {
+
+namespace {
+
+std::shared_ptr<WidgetHost> hostWithLooks(const Extension& extension,
+                                          const WidgetHostSettings& settings,
+                                          const DesktopAppearance& appearance) {
+    UITraitCollection::setSystem(appearance.appliedTo(UITraitCollection::system().get()));
+    return WidgetHost::hostWithExtension_settings(extension, settings);
+}
+
+} // namespace
+
+DesktopWidget::DesktopWidget(const Extension& extension,
+                             const WidgetHostSettings& settings,
+                             std::function<void()> closed)
+    : _host(hostWithLooks(extension, settings, _appearance))
+    , _window(WidgetWindow::windowWithHost(_host))
+    , _events(SystemEvents::factory().get()()) {
+    _window->setClosed(std::move(closed));
+    _window->setFirstFrameShown([this, alive = std::weak_ptr<WidgetWindow>(_window)] {
+        DispatchQueue::mainQueue()->async([this, alive] {
+            if (alive.lock())
+                followDesktop();
+        });
+    });
+    _window->show();
+}
+
+DesktopWidget::~DesktopWidget() {
+    _events->stop();
+    _settings.stop();
+}
+
+void DesktopWidget::followDesktop() {
+    _settings.start([this](const DesktopAppearance& appearance) { takeAppearance(appearance); });
+    _events->start({.lockDidChange = [this](bool locked) { _host->setLocked(locked); },
+                    .machineDidWake = [this] { _host->machineDidWake(); },
+                    .networkDidChange = [this] { _host->networkDidChange(); },
+                    .memoryIsScarce =
+                        [this] {
+                            _host->didReceiveMemoryWarning();
+                        }});
+}
+
+void DesktopWidget::takeAppearance(const DesktopAppearance& appearance) {
+    if (appearance == _appearance)
+        return;
+    _appearance = appearance;
+    _window->setTraits(appearance.appliedTo(UITraitCollection::system().get()));
+    appearance.remember();
+}
+
+int runDesktopWidget(const Extension& extension, const WidgetHostSettings& settings) {
+    const DesktopWidget widget(extension, settings, [] { RunLoop::main().stop(); });
+    return RunLoop::main().run();
+}
+
+} // namespace orvo

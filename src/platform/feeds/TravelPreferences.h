@@ -1,0 +1,22 @@
+#pragma once
+
+#include "platform/foundation/NSError.h"
+
+#include <memory>
+
+namespace orvo {
+
+/// What the person asked for about travelling, kept in the app group's user defaults.
+namespace TravelPreferences {
+
+inline constexpr const char* SuiteName = "group.com.zentu.Orvo";
+inline constexpr const char* StepFreeKey = "Orvo.travel.stepFree";
+
+/// Whether incidents of lifts and ramps count. Default: no.
+[[nodiscard]] bool asksForStepFree();
+/// Nil, or why it could not be kept.
+std::shared_ptr<NSError> setAsksForStepFree(bool stepFree);
+
+} // namespace TravelPreferences
+
+} // namespace orvo

@@ -1,0 +1,50 @@
+#pragma once
+
+#include <cstdint>
+#include <optional>
+#include <string_view>
+#include <vector>
+
+namespace orvo {
+
+/// One text in one language. Views into the message's bytes; valid UTF-8, otherwise as published.
+struct AlertText {
+    std::string_view text;
+    std::string_view language; ///< a BCP-47 tag; empty when untagged
+};
+
+/// A period as published: seconds since 1970, or milliseconds; missing where the feed has nothing.
+struct AlertPeriod {
+    std::optional<std::uint64_t> start;
+    std::optional<std::uint64_t> end;
+};
+
+/// What one informed_entity names. An empty text is an absent field. Views into the message's
+/// bytes.
+struct AlertSelector {
+    std::string_view agencyId;
+    std::string_view routeId;
+    std::string_view stopId;
+    std::string_view tripId;
+    std::string_view tripRouteId;
+    std::optional<std::int32_t> routeType;
+    bool namesDeparture = false; ///< a trip's start time is given
+};
+
+/// One alert of a message, read but not judged. It is valid as long as the message's bytes are.
+struct Alert {
+    std::string_view id; ///< the entity's; empty when it has none that can be read
+    std::vector<AlertPeriod> activePeriods;
+    std::vector<AlertPeriod> communicationPeriods;
+    std::vector<AlertPeriod> impactPeriods;
+    std::vector<AlertSelector> selectors;
+    std::int32_t cause = 1;    ///< a number of `IncidentCause`
+    std::int32_t effect = 8;   ///< a number of `IncidentEffect`
+    std::int32_t severity = 1; ///< a number of `IncidentSeverity`
+    std::vector<AlertText> header;
+    std::vector<AlertText> description;
+    std::vector<AlertText> spokenHeader;
+    std::vector<AlertText> link;
+};
+
+} // namespace orvo

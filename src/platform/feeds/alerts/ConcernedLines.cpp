@@ -1,0 +1,74 @@
+#include "platform/feeds/alerts/ConcernedLines.h"
+
+#include <algorithm>
+
+namespace orvo {
+
+void ConcernedLines::find(const Incident& incident) {
+    _lines.clear();
+    _stops.clear();
+    _members.clear();
+    _mentions.clear();
+    for (std::size_t member = 0; member < incident.members.size(); ++member)
+        addMentions(*incident.members[member].alert, member);
+    const auto isBefore = [](const Mention& a, const Mention& b) {
+        return a.place != b.place ? a.place < b.place : a < b;
+    };
+    if (!std::is_sorted(_mentions.begin(), _mentions.end(), isBefore))
+        std::sort(_mentions.begin(), _mentions.end(), isBefore);
+    for (const Mention& mention : _mentions)
+        takeMention(mention);
+    finishLine();
+}
+
+/// A selector without a route may name every line of an agency: said twice by one alert it is taken
+/// once.
+void ConcernedLines::addMentions(const Alert& alert, std::size_t member) {
+    _broad.clear();
+    for (const AlertSelector& selector : alert.selectors) {
+        const bool isPart = SelectorResolver::namesPart(selector);
+        if (SelectorResolver::routeOf(selector).empty() &&
+            !_broad
+                 .emplace(
+                     selector.agencyId, selector.stopId, selector.routeType.value_or(-1), isPart)
+                 .second)
+            continue;
+        _named.clear();
+        _resolver.resolve(selector, _named);
+        for (const LineTable::Place place : _named)
+            _mentions.push_back({place, isPart, member, selector.stopId});
+    }
+}
+
+void ConcernedLines::takeMention(const Mention& mention) {
+    if (_lines.empty() || _lines.back().place != mention.place) {
+        finishLine();
+        Line& line = _lines.emplace_back();
+        line.place = mention.place;
+        line.entry = &_resolver.table().at(mention.place);
+        line.line = line.entry->line;
+        line.firstStop = _stops.size();
+        line.firstMember = _members.size();
+    }
+    Line& line = _lines.back();
+    line.isPart = line.isPart && mention.isPart;
+    if (_members.size() == line.firstMember || _members.back() != mention.member)
+        _members.push_back(mention.member);
+    if (!mention.stop.empty() && (_stops.size() == line.firstStop || _stops.back() != mention.stop))
+        _stops.push_back(mention.stop);
+}
+
+void ConcernedLines::finishLine() {
+    if (_lines.empty())
+        return;
+    Line& line = _lines.back();
+    const auto members = _members.begin() + static_cast<std::ptrdiff_t>(line.firstMember);
+    std::sort(members, _members.end());
+    _members.erase(std::unique(members, _members.end()), _members.end());
+    if (!line.isPart)
+        _stops.resize(line.firstStop);
+    line.endStop = _stops.size();
+    line.endMember = _members.size();
+}
+
+} // namespace orvo

@@ -1,0 +1,71 @@
+#pragma once
+
+#include "platform/feeds/alerts/Incident.h"
+#include "platform/feeds/alerts/SelectorResolver.h"
+
+#include <set>
+#include <span>
+#include <string_view>
+#include <tuple>
+#include <vector>
+
+namespace orvo {
+
+/// The lines that the alerts of an incident name together, each once, in the schedule's order. A
+/// line that one selector names whole is concerned whole, whatever stops others name. One object
+/// serves many incidents, one after the other.
+class ConcernedLines {
+public:
+    struct Line {
+        LineTable::Place place = LineTable::None;
+        const ScheduleLine* line = nullptr;
+        const LineTable::Entry* entry = nullptr; ///< the line's in the table
+        bool isPart = true; ///< whether only stops or trips of it are concerned
+        std::size_t firstStop = 0, endStop = 0;
+        std::size_t firstMember = 0, endMember = 0;
+    };
+
+    /// The resolver outlives the object.
+    explicit ConcernedLines(SelectorResolver& resolver)
+        : _resolver(resolver) {}
+
+    /// Finds the lines of an incident, in the place of the last one's.
+    void find(const Incident& incident);
+
+    [[nodiscard]] const std::vector<Line>& lines() const noexcept { return _lines; }
+    /// The stops by which the line is concerned, sorted; none where it is concerned whole.
+    [[nodiscard]] std::span<const std::string_view> stopsOf(const Line& line) const noexcept {
+        return std::span(_stops).subspan(line.firstStop, line.endStop - line.firstStop);
+    }
+    /// The places of the incident's members that name the line, ascending.
+    [[nodiscard]] std::span<const std::size_t> membersOf(const Line& line) const noexcept {
+        return std::span(_members).subspan(line.firstMember, line.endMember - line.firstMember);
+    }
+
+private:
+    /// One line named by one selector.
+    struct Mention {
+        LineTable::Place place;
+        bool isPart;
+        std::size_t member;
+        std::string_view stop; // empty for none
+
+        friend auto operator<=>(const Mention& a, const Mention& b) {
+            return std::tie(a.place, a.stop, a.member) <=> std::tie(b.place, b.stop, b.member);
+        }
+    };
+
+    void addMentions(const Alert& alert, std::size_t member);
+    void takeMention(const Mention& mention);
+    void finishLine();
+
+    SelectorResolver& _resolver;
+    std::vector<Line> _lines;
+    std::vector<std::string_view> _stops;
+    std::vector<std::size_t> _members;
+    std::vector<Mention> _mentions;
+    SelectorResolver::Places _named;
+    std::set<std::tuple<std::string_view, std::string_view, std::int32_t, bool>> _broad;
+};
+
+} // namespace orvo

@@ -1,0 +1,61 @@
+#pragma once
+
+#include "platform/feeds/alerts/Alert.h"
+#include "platform/feeds/alerts/AlertStatistics.h"
+
+#include <cstddef>
+#include <optional>
+#include <string_view>
+#include <vector>
+
+namespace orvo {
+
+class WireCursor;
+
+/// What one entity holds.
+struct AlertReading {
+    /// Nothing for an entity that holds no alert, was deleted, or breaks off before its alert.
+    std::optional<Alert> alert;
+    /// Whether selectors may be missing: the entity, its alert or one of its selectors could not be
+    /// read, so that it may concern any line of its feed.
+    bool mayConcernAnyLine = false;
+};
+
+/// Reads the entities of one message. A field that is bad costs only itself and is counted. Text is
+/// checked to be UTF-8. What repeats is read up to a limit over the whole message, so that no body
+/// costs many times its own size.
+class EntityReader {
+public:
+    /// `statistics` outlives the reader.
+    explicit EntityReader(AlertStatistics& statistics)
+        : _statistics(statistics) {}
+
+    [[nodiscard]] AlertReading read(std::string_view entity);
+
+    /// Reads one informed_entity into an empty selector. False when anything of it could not be
+    /// read: all its fields hold together, so that one without a bad field would name more than
+    /// the feed meant.
+    [[nodiscard]] static bool readSelector(std::string_view bytes, AlertSelector& selector);
+    /// Takes the number of an effect or a severity; an unlisted one changes nothing.
+    /// @return whether it is listed
+    static bool readEffect(std::uint64_t number, std::int32_t& effect) noexcept;
+    static bool readSeverity(std::uint64_t number, std::int32_t& severity) noexcept;
+
+private:
+    void readAlert(std::string_view bytes, AlertReading& reading);
+    void readAlertField(const WireCursor& field, AlertReading& reading);
+    void readPeriod(const WireCursor& field, std::vector<AlertPeriod>& periods);
+    void takeSelector(const WireCursor& field, AlertReading& reading);
+    void readNumber(const WireCursor& field,
+                    bool (*take)(std::uint64_t, std::int32_t&) noexcept,
+                    std::int32_t& number);
+    void readTexts(const WireCursor& field, std::vector<AlertText>& texts);
+    void readText(std::string_view bytes, std::vector<AlertText>& texts);
+    [[nodiscard]] bool takeOne() noexcept;
+
+    AlertStatistics& _statistics;
+    std::vector<AlertSelector> _selectors; // of the entity being read
+    std::size_t _repeatsLeft = 1'000'000;
+};
+
+} // namespace orvo

@@ -1,0 +1,53 @@
+#include "platform/feeds/alerts/HeaderFingerprint.h"
+
+#include "platform/feeds/alerts/ByteScan.h"
+#include "platform/feeds/alerts/IncidentMerger.h"
+
+#include <algorithm>
+#include <string>
+
+namespace orvo {
+
+namespace {
+
+/// So many bytes of the normalised text count.
+constexpr std::size_t Counted = 2 * ByteScan::Word;
+/// So many bytes of a text without markup are mostly enough to have them.
+constexpr std::size_t Enough = 48;
+
+std::uint64_t hashOf(std::string_view begin) {
+    return ByteScan::quickHash(begin.substr(0, Counted));
+}
+
+/// Whether the text begins with what counts, just as it would be normalised.
+bool beginsPlainly(std::string_view text) {
+    return text.size() >= Counted && text[0] != ' ' && text[Counted - 1] != ' ' &&
+           !(text[ByteScan::Word - 1] == ' ' && text[ByteScan::Word] == ' ') &&
+           ByteScan::isPlainText(ByteScan::wordAt(text.data())) &&
+           ByteScan::isPlainText(ByteScan::wordAt(text.data() + ByteScan::Word));
+}
+
+/// The beginning of the text, up to the end of a character.
+std::string_view beginningOf(std::string_view text) {
+    std::size_t end = std::min(Enough, text.size());
+    while (end > 0 && end < text.size() && (static_cast<unsigned char>(text[end]) & 0xC0U) == 0x80U)
+        --end;
+    return text.substr(0, end);
+}
+
+} // namespace
+
+std::uint64_t headerFingerprint(std::string_view text) {
+    if (beginsPlainly(text))
+        return hashOf(text);
+    const std::string_view begin = beginningOf(text);
+    if (begin.find_first_of("<&") == std::string_view::npos) {
+        // A blank at the cut is dropped here, but not in the middle of the whole text.
+        const std::string normalised = IncidentMerger::normalised(begin);
+        if (normalised.size() >= Counted)
+            return hashOf(normalised);
+    }
+    return hashOf(IncidentMerger::normalised(text));
+}
+
+} // namespace orvo

@@ -1,0 +1,46 @@
+#pragma once
+
+#include "platform/feeds/alerts/Incident.h"
+#include "platform/feeds/alerts/LanguagePreference.h"
+
+#include <cstddef>
+#include <string>
+#include <string_view>
+#include <unordered_map>
+#include <vector>
+
+namespace orvo {
+
+/// Finds which alerts are the same incident, so that neither publication under new identifiers, nor
+/// one entity for each route, nor one for each language multiplies incidents.
+///
+/// Alerts of one source under one identifier are united where each only adds languages; and so are
+/// alerts of the same effect whose header and description, in the agency's language or else the
+/// first, are the same but for markup and blanks.
+class IncidentMerger {
+public:
+    /// @param feed the feed's short name
+    /// @param agencyLanguage a BCP-47 tag; empty where the schedule does not say
+    IncidentMerger(std::string feed, std::string_view agencyLanguage);
+
+    /// Alerts are added in the order of the feed and outlive the incidents, which take their texts.
+    void add(Alert& alert, std::size_t source);
+    /// The incidents, in the order in which their first alerts were added. Ends the merger.
+    [[nodiscard]] std::vector<Incident> take();
+
+    /// A text as it is compared: clean, on one line, with plain blanks only.
+    [[nodiscard]] static std::string normalised(std::string_view text);
+
+private:
+    [[nodiscard]] Incident* translationPartner(const Alert& alert, std::size_t source);
+    [[nodiscard]] std::string contentOf(const Incident& incident) const;
+    void mergeSameContent();
+
+    std::string _feed;
+    LanguagePreference _preference;
+    std::vector<Incident> _incidents;
+    std::size_t _source = 0;
+    std::unordered_map<std::string_view, std::vector<std::size_t>> _byId; // of the current source
+};
+
+} // namespace orvo

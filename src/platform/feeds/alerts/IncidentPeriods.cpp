@@ -1,0 +1,113 @@
+#include "platform/feeds/alerts/IncidentPeriods.h"
+
+#include "platform/feeds/alerts/HeaderTime.h"
+
+#include <algorithm>
+#include <limits>
+
+namespace orvo {
+
+namespace {
+
+constexpr std::uint64_t EndOfYear9999 = 253'402'300'799;
+/// Some feeds mean "open" by the last year that their calendar knows, in seconds. Read as
+/// milliseconds it would be a day in 1978.
+constexpr std::uint64_t BeginningOfYear9999 = 253'370'764'800;
+constexpr std::int64_t LeastGap = 60;
+constexpr double Horizon = 24.0 * 60 * 60;
+
+std::int64_t startOf(const IncidentPeriod& period) {
+    return period.start.value_or(std::numeric_limits<std::int64_t>::min());
+}
+
+bool isOver(const IncidentPeriod& period, double now) {
+    return period.end && static_cast<double>(*period.end) < now;
+}
+
+/// Whether `later`, which starts no earlier, goes on where `earlier` ends.
+bool continues(const IncidentPeriod& earlier, const IncidentPeriod& later) {
+    return !earlier.end || !later.start || *later.start - *earlier.end < LeastGap;
+}
+
+/// As `wholeSeconds`, for dates up to the year 9999 only.
+std::optional<std::int64_t> moment(std::optional<std::uint64_t> published) {
+    const std::uint64_t seconds = wholeSeconds(published.value_or(0));
+    if (seconds == 0 || seconds > EndOfYear9999)
+        return std::nullopt;
+    return static_cast<std::int64_t>(seconds);
+}
+
+bool isLastYear(std::optional<std::uint64_t> published) {
+    return published && *published >= BeginningOfYear9999 && *published <= EndOfYear9999;
+}
+
+const std::vector<AlertPeriod>& publishedPeriods(const Alert& alert) {
+    if (!alert.impactPeriods.empty())
+        return alert.impactPeriods;
+    return alert.communicationPeriods.empty() ? alert.activePeriods : alert.communicationPeriods;
+}
+
+} // namespace
+
+namespace IncidentPeriods {
+
+std::optional<IncidentPeriod> fromPublished(const AlertPeriod& period) noexcept {
+    const IncidentPeriod result{moment(period.start),
+                                isLastYear(period.end) ? std::nullopt : moment(period.end)};
+    const bool neverBegins = wholeSeconds(period.start.value_or(0)) > EndOfYear9999;
+    if (neverBegins || (result.start && result.end && *result.end <= *result.start))
+        return std::nullopt;
+    return result;
+}
+
+std::vector<IncidentPeriod> ofAlert(const Alert& alert) {
+    const std::vector<AlertPeriod>& published = publishedPeriods(alert);
+    if (published.empty())
+        return {IncidentPeriod{}};
+    std::vector<IncidentPeriod> periods;
+    periods.reserve(published.size());
+    for (const AlertPeriod& period : published)
+        if (const auto result = fromPublished(period))
+            periods.push_back(*result);
+    return periods;
+}
+
+std::optional<std::int64_t> earliestStart(const Alert& alert) noexcept {
+    std::optional<std::int64_t> earliest;
+    const auto consider = [&](const std::vector<AlertPeriod>& periods) {
+        for (const AlertPeriod& period : periods)
+            if (const auto start = moment(period.start); start && (!earliest || *start < *earliest))
+                earliest = start;
+    };
+    consider(alert.impactPeriods);
+    consider(alert.communicationPeriods);
+    if (alert.impactPeriods.empty() && alert.communicationPeriods.empty())
+        consider(alert.activePeriods);
+    return earliest;
+}
+
+std::vector<IncidentPeriod> currentAndComing(std::vector<IncidentPeriod> periods, double now) {
+    std::erase_if(periods, [&](const IncidentPeriod& period) { return isOver(period, now); });
+    std::sort(periods.begin(), periods.end(), [](const auto& a, const auto& b) {
+        return startOf(a) < startOf(b);
+    });
+    std::vector<IncidentPeriod> joined;
+    for (const IncidentPeriod& period : periods) {
+        if (joined.empty() || !continues(joined.back(), period))
+            joined.push_back(period);
+        else if (joined.back().end)
+            joined.back().end = period.end ? std::max(*joined.back().end, *period.end) : period.end;
+    }
+    std::erase_if(joined, [&](const IncidentPeriod& period) {
+        return period.start && static_cast<double>(*period.start) > now + Horizon;
+    });
+    return joined;
+}
+
+bool isCurrent(const IncidentPeriod& period, double now) noexcept {
+    return (!period.start || static_cast<double>(*period.start) <= now) && !isOver(period, now);
+}
+
+} // namespace IncidentPeriods
+
+} // namespace orvo

@@ -1,0 +1,162 @@
+#include "platform/feeds/alerts/IncidentRecords.h"
+
+#include "platform/feeds/alerts/FeedAffectedEntity.h"
+#include "platform/foundation/NSDate.h"
+
+#include <algorithm>
+#include <utility>
+
+namespace orvo {
+
+namespace {
+
+constexpr std::size_t MostLookedAt = 16;
+
+std::shared_ptr<NSDate> dateOf(const std::optional<std::int64_t>& seconds) {
+    return seconds ? NSDate::dateWithTimeIntervalSince1970(static_cast<double>(*seconds)) : nullptr;
+}
+
+/// The worst that any of the alerts says.
+IncidentSeverity severityOf(const Incident& incident) {
+    std::int32_t severity = static_cast<std::int32_t>(IncidentSeverity::Unknown);
+    for (const IncidentMember& member : incident.members)
+        severity = std::max(severity, member.alert->severity);
+    return static_cast<IncidentSeverity>(severity);
+}
+
+/// The first that any of the alerts tells.
+IncidentCause causeOf(const Incident& incident) {
+    for (const IncidentMember& member : incident.members)
+        if (const auto cause = static_cast<IncidentCause>(member.alert->cause);
+            cause != IncidentCause::UnknownCause)
+            return cause;
+    return IncidentCause::UnknownCause;
+}
+
+/// The lines of an incident and their stops, in little space.
+class ConcernedEntities final : public AffectedEntitySource {
+public:
+    explicit ConcernedEntities(const ConcernedLines& lines) {
+        std::size_t stops = 0;
+        for (const ConcernedLines::Line& line : lines.lines())
+            stops += lines.stopsOf(line).size();
+        _stops->reserve(stops);
+        _lines.reserve(lines.lines().size());
+        for (const ConcernedLines::Line& line : lines.lines()) {
+            for (const std::string_view stop : lines.stopsOf(line))
+                _stops->emplace_back(stop);
+            _lines.push_back({line.entry->muid, _stops->size()});
+        }
+    }
+
+    [[nodiscard]] std::shared_ptr<NSArray> affectedEntities() const override {
+        NSArray::Elements entities;
+        entities.reserve(_lines.size());
+        std::size_t firstStop = 0;
+        for (const Line& line : _lines) {
+            entities.push_back(FeedAffectedEntity::initWithMuid_stops_firstStop_endStop(
+                line.muid, _stops, firstStop, line.endStop));
+            firstStop = line.endStop;
+        }
+        return NSArray::arrayWithObjects(std::move(entities));
+    }
+
+private:
+    struct Line {
+        std::uint64_t muid;
+        std::size_t endStop;
+    };
+    std::vector<Line> _lines;
+    std::shared_ptr<std::vector<std::string>> _stops = std::make_shared<std::vector<std::string>>();
+};
+
+std::optional<std::int64_t> earliestStart(const Incident& incident) {
+    std::optional<std::int64_t> earliest;
+    for (const IncidentMember& member : incident.members)
+        if (const auto start = IncidentPeriods::earliestStart(*member.alert);
+            start && (!earliest || *start < *earliest))
+            earliest = start;
+    return earliest;
+}
+
+} // namespace
+
+IncidentRecords::IncidentRecords(const RecordContext& context,
+                                 const Incident& incident,
+                                 const ConcernedLines& lines)
+    : _context(context)
+    , _incident(incident) {
+    _details.feed = context.feed;
+    _details.severity = severityOf(incident);
+    _details.effect = static_cast<IncidentEffect>(incident.effect);
+    _details.cause = causeOf(incident);
+    IncidentTexts texts = context.wording.textsOf(incident, lines, _details.cause);
+    _details.spokenTitle = std::move(texts.spokenTitle);
+    _details.link = std::move(texts.link);
+    _details.entitySource = std::make_shared<ConcernedEntities>(lines);
+    _fields = sharedFields(std::move(texts));
+}
+
+TransitIncidentRecord::Fields IncidentRecords::sharedFields(IncidentTexts texts) const {
+    double headerTime = 0;
+    for (const IncidentMember& member : _incident.members)
+        headerTime = std::max(headerTime, _context.headerTimes[member.source]);
+    TransitIncidentRecord::Fields fields;
+    fields.muid = _incident.muid;
+    fields.messageForRoutePlanning = texts.title;
+    fields.messageForRouteStepping = texts.title;
+    fields.messageForNonRoutable = texts.title;
+    fields.title = std::move(texts.title);
+    fields.summary = std::move(texts.summary);
+    fields.fullDescription = std::move(texts.fullDescription);
+    fields.iconType = _incident.effect;
+    fields.lastUpdated = NSDate::dateWithTimeIntervalSince1970(headerTime);
+    const auto start = earliestStart(_incident);
+    fields.creationDate = start ? dateOf(start) : fields.lastUpdated;
+    return fields;
+}
+
+const std::string& IncidentRecords::timeZoneOf(const ConcernedLines::Line& line) const {
+    const std::string& own = line.line->agency.timezone;
+    return own.empty() ? _context.timeZone : own;
+}
+
+std::shared_ptr<FeedTransitIncident> IncidentRecords::made(const ConcernedLines::Line& line,
+                                                           const IncidentPeriod& period) const {
+    // There are few different ones of an incident, and like ones are asked for in a row.
+    const std::size_t looked = std::min(_made.size(), MostLookedAt);
+    const auto found = std::find_if(_made.rbegin(),
+                                    _made.rbegin() + static_cast<std::ptrdiff_t>(looked),
+                                    [&](const Made& made) {
+                                        const auto& details = made.record->details();
+                                        return made.period == period &&
+                                               details.isPartOfLine == line.isPart &&
+                                               details.timeZone.value_or("") == timeZoneOf(line);
+                                    });
+    return found == _made.rbegin() + static_cast<std::ptrdiff_t>(looked) ? nullptr : found->record;
+}
+
+std::shared_ptr<FeedTransitIncident> IncidentRecords::record(const ConcernedLines::Line& line,
+                                                             const IncidentPeriod& period) {
+    if (auto known = made(line, period))
+        return known;
+    const bool isFirst = _made.empty();
+    const auto effect = static_cast<IncidentEffect>(_incident.effect);
+    TransitIncidentRecord::Fields fields =
+        isFirst ? std::move(_fields) : _made.front().record->fields();
+    fields.startDate = dateOf(period.start);
+    fields.endDate = dateOf(period.end);
+    fields.isBlockingIncident = effect == IncidentEffect::NoService && !line.isPart;
+    FeedTransitIncident::Details details =
+        isFirst ? std::move(_details) : _made.front().record->details();
+    details.isPartOfLine = line.isPart;
+    details.timeZone.reset();
+    if (!timeZoneOf(line).empty())
+        details.timeZone = timeZoneOf(line);
+    auto record =
+        FeedTransitIncident::initWithFields_details(std::move(fields), std::move(details));
+    _made.push_back({period, record});
+    return record;
+}
+
+} // namespace orvo

@@ -1,0 +1,55 @@
+#pragma once
+
+#include "platform/feeds/alerts/ConcernedLines.h"
+#include "platform/feeds/alerts/Incident.h"
+#include "platform/feeds/alerts/IncidentPeriods.h"
+#include "platform/feeds/alerts/IncidentWording.h"
+#include "platform/geoservices/FeedTransitIncident.h"
+
+#include <memory>
+#include <string>
+#include <vector>
+
+namespace orvo {
+
+/// What all records of one feed have in common.
+struct RecordContext {
+    std::string feed;                ///< the feed's short name
+    std::string timeZone;            ///< where an agency has none of its own; may be empty
+    std::vector<double> headerTimes; ///< of each source, in seconds since 1970
+    IncidentWording wording;
+};
+
+/// Makes the records of one incident. What they share is made once.
+class IncidentRecords {
+public:
+    /// The context and the incident outlive the object.
+    IncidentRecords(const RecordContext& context,
+                    const Incident& incident,
+                    const ConcernedLines& lines);
+
+    /// The incident as it concerns one of its lines, in one period. Lines that it concerns alike
+    /// have the same record.
+    [[nodiscard]] std::shared_ptr<FeedTransitIncident> record(const ConcernedLines::Line& line,
+                                                              const IncidentPeriod& period);
+
+private:
+    [[nodiscard]] const std::string& timeZoneOf(const ConcernedLines::Line& line) const;
+    [[nodiscard]] std::shared_ptr<FeedTransitIncident> made(const ConcernedLines::Line& line,
+                                                            const IncidentPeriod& period) const;
+    [[nodiscard]] TransitIncidentRecord::Fields sharedFields(IncidentTexts texts) const;
+
+    const RecordContext& _context;
+    const Incident& _incident;
+    TransitIncidentRecord::Fields _fields; // given to the first record, which others copy
+    FeedTransitIncident::Details _details; // likewise
+
+    /// A record and what it was made for.
+    struct Made {
+        IncidentPeriod period;
+        std::shared_ptr<FeedTransitIncident> record;
+    };
+    std::vector<Made> _made;
+};
+
+} // namespace orvo

@@ -1,0 +1,197 @@
+#include "platform/feeds/alerts/TextCleaner.h"
+
+#include "platform/feeds/alerts/ByteScan.h"
+#include "platform/feeds/alerts/HTMLEntities.h"
+#include "platform/feeds/alerts/TagStripper.h"
+
+#include <unicode/ubrk.h>
+#include <unicode/utext.h>
+#include <unicode/utf8.h>
+
+#include <algorithm>
+#include <memory>
+#include <type_traits>
+
+namespace orvo {
+
+namespace {
+
+enum class CharacterKind { Visible, Blank, NoBreakBlank, LineBreak, ParagraphBreak, Dropped };
+
+CharacterKind kindOf(UChar32 c) {
+    if (c == ' ' || c == '\t' || (c >= 0x2000 && c <= 0x200A) || c == 0x205F || c == 0x3000)
+        return CharacterKind::Blank;
+    if (c == 0x00A0 || c == 0x202F)
+        return CharacterKind::NoBreakBlank;
+    if (c == '\n' || c == '\v' || c == '\f' || c == 0x85 || c == 0x2028)
+        return CharacterKind::LineBreak;
+    if (c == 0x2029)
+        return CharacterKind::ParagraphBreak;
+    const bool isControl = c < 0x20 || (c >= 0x7F && c < 0xA0);
+    const bool turnsDirection = (c >= 0x202A && c <= 0x202E) || (c >= 0x2066 && c <= 0x2069);
+    const bool isMark = c == 0xFEFF || (c >= 0xFFF9 && c <= 0xFFFB);
+    return isControl || turnsDirection || isMark ? CharacterKind::Dropped : CharacterKind::Visible;
+}
+
+/// Puts characters one behind the other with no more blanks and line breaks between them than
+/// needed.
+class Tidier {
+public:
+    explicit Tidier(std::size_t length) { _result.reserve(length); }
+
+    void add(CharacterKind kind, std::string_view character) {
+        switch (kind) {
+        case CharacterKind::Visible:
+            return addVisible(character);
+        case CharacterKind::Blank:
+            _blank = " ";
+            return;
+        case CharacterKind::NoBreakBlank:
+            _blank = _blank.empty() ? character : " ";
+            return;
+        case CharacterKind::LineBreak:
+            _lineBreaks += 1;
+            return;
+        case CharacterKind::ParagraphBreak:
+            _lineBreaks += 2;
+            return;
+        case CharacterKind::Dropped:
+            return;
+        }
+    }
+
+    std::string take() { return std::move(_result); }
+
+private:
+    void addVisible(std::string_view character) {
+        if (!_result.empty()) {
+            if (_lineBreaks > 0)
+                _result.append(std::min<std::size_t>(_lineBreaks, 2), '\n');
+            else
+                _result += _blank;
+        }
+        _blank = {};
+        _lineBreaks = 0;
+        _result += character;
+    }
+
+    std::string _result;
+    std::string_view _blank;
+    std::size_t _lineBreaks = 0;
+};
+
+std::string tidied(std::string_view text) {
+    Tidier tidier(text.size());
+    const auto* const bytes = reinterpret_cast<const std::uint8_t*>(text.data());
+    const auto length = static_cast<std::int32_t>(text.size());
+    for (std::int32_t i = 0; i < length;) {
+        const std::int32_t begin = i;
+        UChar32 c = 0;
+        U8_NEXT_OR_FFFD(bytes, i, length, c);
+        if (c == '\r' && (i == length || text[static_cast<std::size_t>(i)] != '\n'))
+            c = '\n';
+        tidier.add(
+            kindOf(c),
+            text.substr(static_cast<std::size_t>(begin), static_cast<std::size_t>(i - begin)));
+    }
+    return tidier.take();
+}
+
+bool isPlainCharacter(char c) {
+    return c >= ' ' && c <= '~' && c != '<' && c != '&';
+}
+
+/// Whether cleaning would change nothing, and that is quickly seen: visible ASCII without markup
+/// and single blanks between.
+bool isPlain(std::string_view text) {
+    if (text.empty())
+        return true;
+    if (text.front() == ' ' || text.back() == ' ')
+        return false;
+    // Words overlap by a byte, so that blanks are seen in a row wherever they lie.
+    std::size_t i = 0;
+    for (; i + ByteScan::Word <= text.size(); i += ByteScan::Word - 1)
+        if (!ByteScan::isPlainText(ByteScan::wordAt(text.data() + i)))
+            return false;
+    for (; i < text.size(); ++i)
+        if (!isPlainCharacter(text[i]) || (text[i] == ' ' && text[i + 1] == ' '))
+            return false;
+    return true;
+}
+
+std::string_view trimmed(std::string_view text) {
+    constexpr std::string_view Blanks = " \t\r\n";
+    text.remove_prefix(std::min(text.find_first_not_of(Blanks), text.size()));
+    return text.substr(0, text.find_last_not_of(Blanks) + 1);
+}
+
+/// One step of taking HTML apart. Text that was escaped twice needs two.
+std::string withoutMarkup(std::string text) {
+    if (text.find('<') != std::string::npos)
+        text = TagStripper::stripped(text);
+    if (text.find('&') != std::string::npos)
+        text = HTMLEntities::decoded(text);
+    return text;
+}
+
+using Characters = std::unique_ptr<UBreakIterator, decltype(&ubrk_close)>;
+
+} // namespace
+
+namespace TextCleaner {
+
+std::string clean(std::string_view text) {
+    text = trimmed(text);
+    if (isPlain(text))
+        return std::string(text);
+    if (text.find_first_of("<&") == std::string_view::npos)
+        return tidied(text);
+    std::string plain = withoutMarkup(withoutMarkup(std::string(text)));
+    if (plain.find('<') != std::string::npos)
+        plain = TagStripper::stripped(plain);
+    return tidied(plain);
+}
+
+std::string cleanLine(std::string_view text) {
+    text = trimmed(text);
+    return isPlain(text) ? std::string(text) : onOneLine(clean(text));
+}
+
+std::string onOneLine(std::string_view cleanText) {
+    if (isPlain(cleanText))
+        return std::string(cleanText);
+    std::string line(cleanText);
+    std::replace(line.begin(), line.end(), '\n', ' ');
+    return tidied(line);
+}
+
+std::string_view firstParagraph(std::string_view cleanText) noexcept {
+    return cleanText.substr(0, cleanText.find("\n\n"));
+}
+
+std::string capped(std::string text, std::size_t most) {
+    if (text.size() <= most)
+        return text;
+    const auto* const bytes = reinterpret_cast<const std::uint8_t*>(text.data());
+    const auto length = static_cast<std::int32_t>(text.size());
+    std::int32_t cut = 0;
+    for (std::size_t count = 0; count < most && cut < length; ++count)
+        U8_FWD_1(bytes, cut, length);
+    if (cut == length)
+        return text;
+    UErrorCode status = U_ZERO_ERROR;
+    const Characters characters(ubrk_open(UBRK_CHARACTER, "", nullptr, 0, &status), &ubrk_close);
+    UText view = UTEXT_INITIALIZER;
+    utext_openUTF8(&view, text.data(), length, &status);
+    ubrk_setUText(characters.get(), &view, &status);
+    if (U_SUCCESS(status) && !ubrk_isBoundary(characters.get(), cut))
+        cut = std::max(ubrk_preceding(characters.get(), cut), 0);
+    utext_close(&view);
+    text.resize(static_cast<std::size_t>(cut));
+    text.erase(std::min(text.size(), text.find_last_not_of(" \n") + 1));
+    return text;
+}
+
+} // namespace TextCleaner
+
+} // namespace orvo

@@ -1,0 +1,37 @@
+#pragma once
+
+#include <cstddef>
+#include <string>
+#include <string_view>
+
+namespace orvo {
+
+/// Makes published text fit to be shown.
+namespace TextCleaner {
+
+/// The most characters of a title, and of any other text.
+inline constexpr std::size_t LongestTitle = 200;
+inline constexpr std::size_t LongestText = 20'000;
+
+/// Plain text: tags stripped, character references decoded (twice where they were escaped twice),
+/// control characters and those that override the direction of writing dropped. Line breaks stay,
+/// at most one empty line in a row; runs of blanks become one; nothing blank stands at either end
+/// of a line. Empty for a text of blanks. `text` is valid UTF-8.
+[[nodiscard]] std::string clean(std::string_view text);
+
+/// `clean` and then `onOneLine`.
+[[nodiscard]] std::string cleanLine(std::string_view text);
+
+/// A clean text with each run of blanks and line breaks as one blank.
+[[nodiscard]] std::string onOneLine(std::string_view cleanText);
+
+/// The first paragraph of a clean text: up to the first empty line.
+[[nodiscard]] std::string_view firstParagraph(std::string_view cleanText) noexcept;
+
+/// The text, or as much of its beginning as is whole characters (as a reader sees them) and at most
+/// `most` Unicode characters. No blank stands at the cut.
+[[nodiscard]] std::string capped(std::string text, std::size_t most);
+
+} // namespace TextCleaner
+
+} // namespace orvo

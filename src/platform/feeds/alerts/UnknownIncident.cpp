@@ -1,0 +1,70 @@
+#include "platform/feeds/alerts/UnknownIncident.h"
+
+#include "platform/feeds/alerts/FeedAffectedEntity.h"
+#include "platform/feeds/alerts/IncidentWords.h"
+#include "platform/foundation/Hashing.h"
+
+#include <algorithm>
+#include <utility>
+
+namespace orvo {
+
+namespace {
+
+std::uint64_t muidOf(const UnknownLine& line) {
+    std::string content = line.feed;
+    content += '\0';
+    content += std::to_string(line.muid);
+    content += '\0';
+    content += "unknown";
+    return std::max<std::uint64_t>(stableHash(content), 1);
+}
+
+std::string reasonInWords(const UnknownStatus& status, const IncidentWords& words) {
+    switch (status.reason) {
+    case UnknownStatus::Reason::SourceFailed:
+        return words.sourceFailed();
+    case UnknownStatus::Reason::SelectorLost:
+        return words.selectorLost();
+    case UnknownStatus::Reason::LineDeparted:
+        return words.lineDeparted();
+    case UnknownStatus::Reason::NothingToAsk:
+        return words.nothingToAsk();
+    }
+    return {};
+}
+
+} // namespace
+
+std::shared_ptr<FeedTransitIncident> makeUnknownIncident(const UnknownLine& line,
+                                                         const UnknownStatus& status,
+                                                         double now,
+                                                         const std::string& language) {
+    const IncidentWords words(language);
+    std::optional<double> age;
+    if (status.lastKnown)
+        age = std::max(now - *status.lastKnown, 0.0);
+
+    TransitIncidentRecord::Fields fields;
+    fields.muid = muidOf(line);
+    fields.title = words.statusUnknown();
+    fields.summary = words.lastKnown(line.systemName, age);
+    fields.fullDescription = *fields.summary + "\n\n" + reasonInWords(status, words);
+    if (!status.cause.empty())
+        *fields.fullDescription += "\n\n" + status.cause;
+    fields.messageForRoutePlanning = fields.title;
+    fields.messageForRouteStepping = fields.title;
+    fields.messageForNonRoutable = fields.title;
+    fields.iconType = static_cast<std::int32_t>(IncidentEffect::UnknownEffect);
+    fields.affectedEntities = NSArray::arrayOf(
+        {FeedAffectedEntity::initWithMuid_stops_firstStop_endStop(line.muid, nullptr, 0, 0)});
+
+    FeedTransitIncident::Details details;
+    details.feed = line.feed;
+    details.isUnknown = true;
+    if (!line.timeZone.empty())
+        details.timeZone = line.timeZone;
+    return FeedTransitIncident::initWithFields_details(std::move(fields), std::move(details));
+}
+
+} // namespace orvo

@@ -1,0 +1,36 @@
+#pragma once
+
+#include "platform/foundation/NSError.h"
+#include "platform/sqlite/SQLiteDatabase.h"
+
+#include <filesystem>
+#include <memory>
+#include <optional>
+
+namespace orvo {
+
+/// The tables in which schedules are kept, and their version.
+namespace ScheduleTables {
+
+/// What went wrong with the file, in words for the person.
+[[nodiscard]] std::shared_ptr<NSError> failureOf(const SQLiteFailure& failure,
+                                                 const std::filesystem::path& path);
+
+/// Opens the file for writing, and makes it, its folder and the tables when missing. Any number of
+/// processes may do so at once. Waits up to `patience` seconds for other writers.
+/// @return nil, with the reason in `error`: it cannot be opened, or was written by a later version
+[[nodiscard]] std::unique_ptr<SQLiteDatabase>
+openForWriting(const std::filesystem::path& path, int patience, std::shared_ptr<NSError>& error);
+
+/// Opens the file for reading only.
+/// @return nil without an error when there is no file, or one that has no tables yet
+[[nodiscard]] std::unique_ptr<SQLiteDatabase> openForReading(const std::filesystem::path& path,
+                                                             std::shared_ptr<NSError>& error);
+
+/// An empty store in memory, or a copy of the file's.
+[[nodiscard]] std::unique_ptr<SQLiteDatabase>
+openInMemory(const std::optional<std::filesystem::path>& copied, std::shared_ptr<NSError>& error);
+
+} // namespace ScheduleTables
+
+} // namespace orvo

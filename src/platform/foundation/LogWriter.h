@@ -1,0 +1,22 @@
+#pragma once
+
+#include "platform/foundation/Log.h"
+
+#include <string>
+
+namespace orvo::LogWriter {
+
+/// One line, ending in a line feed, for people at a terminal:
+/// `2024-07-24T01:28:40Z com.zentu.Orvo TransitWidget debug: Received 3 line items.` Control
+/// characters of the text are escaped, so that a line stays one line whatever it quotes.
+[[nodiscard]] std::string
+line(const LogRecord& record, const std::string& text, double secondsSince1970);
+
+/// Whether `stream` ("DEVICE:INODE", what `JOURNAL_STREAM` holds; may be nil) names the file that
+/// `fileDescriptor` is connected to.
+[[nodiscard]] bool isConnectedTo(const char* stream, int fileDescriptor);
+
+/// To the journal where standard error goes there, else to standard error.
+[[nodiscard]] LogSink standard();
+
+} // namespace orvo::LogWriter

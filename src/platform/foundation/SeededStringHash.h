@@ -1,0 +1,32 @@
+#pragma once
+
+#include <cstddef>
+#include <cstdint>
+#include <functional>
+#include <string>
+#include <string_view>
+#include <unordered_map>
+#include <unordered_set>
+
+namespace orvo {
+
+/// The same for equal numbers in this process, and another in every process: who makes a file
+/// cannot choose keys that all fall into one bucket. A one-to-one mapping, so that it makes no two
+/// hashes the same.
+[[nodiscard]] std::uint64_t scattered(std::uint64_t hash);
+
+/// Hashes text that others chose, for tables that live as long as the process: seeded anew in every
+/// process, so that nobody can prepare texts with one hash. Never to be stored or shown.
+struct SeededStringHash {
+    using is_transparent = void;
+
+    [[nodiscard]] std::size_t operator()(std::string_view text) const noexcept;
+};
+
+/// Tables of foreign text. Those with `std::string` keys are asked with views as well.
+template <class Key, class Value>
+using SeededTextMap = std::unordered_map<Key, Value, SeededStringHash, std::equal_to<>>;
+template <class Key>
+using SeededTextSet = std::unordered_set<Key, SeededStringHash, std::equal_to<>>;
+
+} // namespace orvo

@@ -1,0 +1,92 @@
+#pragma once
+
+#include "platform/geoservices/TransitIncidentRecord.h"
+
+#include <memory>
+#include <optional>
+#include <string>
+
+namespace orvo {
+
+/// GTFS-Realtime `Alert.SeverityLevel`, by its numbers.
+enum class IncidentSeverity : std::int32_t { Unknown = 1, Info = 2, Warning = 3, Severe = 4 };
+
+/// GTFS-Realtime `Alert.Effect`, by its numbers.
+enum class IncidentEffect : std::int32_t {
+    NoService = 1,
+    ReducedService = 2,
+    SignificantDelays = 3,
+    Detour = 4,
+    AdditionalService = 5,
+    ModifiedService = 6,
+    OtherEffect = 7,
+    UnknownEffect = 8,
+    StopMoved = 9,
+    NoEffect = 10,
+    AccessibilityIssue = 11,
+};
+
+/// GTFS-Realtime `Alert.Cause`, by its numbers.
+enum class IncidentCause : std::int32_t {
+    UnknownCause = 1,
+    OtherCause = 2,
+    TechnicalProblem = 3,
+    Strike = 4,
+    Demonstration = 5,
+    Accident = 6,
+    Holiday = 7,
+    Weather = 8,
+    Maintenance = 9,
+    Construction = 10,
+    PoliceActivity = 11,
+    MedicalEmergency = 12,
+};
+
+/// The GTFS-Realtime name of a value: `NO_SERVICE`. An unlisted number is given as the number.
+[[nodiscard]] std::string nameOf(IncidentSeverity severity);
+[[nodiscard]] std::string nameOf(IncidentEffect effect);
+[[nodiscard]] std::string nameOf(IncidentCause cause);
+
+/// Makes the affected entities of an incident each time somebody asks for them. An incident may
+/// concern hundreds of lines that nobody looks at. Immutable; any thread.
+class AffectedEntitySource {
+public:
+    AffectedEntitySource() = default;
+    AffectedEntitySource(const AffectedEntitySource&) = delete;
+    AffectedEntitySource& operator=(const AffectedEntitySource&) = delete;
+    virtual ~AffectedEntitySource() = default;
+
+    [[nodiscard]] virtual std::shared_ptr<NSArray> affectedEntities() const = 0;
+};
+
+/// An incident of a public feed, with what the platform's record has no place for.
+class FeedTransitIncident final : public TransitIncidentRecord {
+public:
+    struct Details {
+        std::string feed; ///< the feed's short name
+        IncidentSeverity severity = IncidentSeverity::Unknown;
+        IncidentEffect effect = IncidentEffect::UnknownEffect;
+        IncidentCause cause = IncidentCause::UnknownCause;
+        bool isPartOfLine = false; ///< only stops or trips of the line are concerned
+        bool isUnknown = false;    ///< no incident at all: a status that could not be proven
+        std::optional<std::string> spokenTitle; ///< as a voice should say it
+        std::optional<std::string> link;        ///< a web page about it
+        std::optional<std::string> timeZone;    ///< the agency's, an IANA name
+        /// Answers instead of the field `affectedEntities`; nil where that one does.
+        std::shared_ptr<const AffectedEntitySource> entitySource;
+    };
+
+    [[nodiscard]] static std::shared_ptr<FeedTransitIncident>
+    initWithFields_details(Fields fields, Details details);
+
+    [[nodiscard]] const Details& details() const noexcept { return _details; }
+    [[nodiscard]] std::shared_ptr<NSArray> affectedEntities() const override {
+        return _details.entitySource ? _details.entitySource->affectedEntities()
+                                     : fields().affectedEntities;
+    }
+
+private:
+    Details _details;
+};
+
+} // namespace orvo

@@ -1,0 +1,182 @@
+#include "platform/mapuikit/ShieldPainter.h"
+
+#include "platform/geoservices/TransitArtworkTypes.h"
+
+#include <QFont>
+#include <QFontDatabase>
+#include <QGuiApplication>
+#include <QImage>
+#include <QPainter>
+#include <QPainterPath>
+
+#include <algorithm>
+#include <cmath>
+
+namespace orvo::ShieldPainter {
+
+namespace {
+
+constexpr double TextPart = 0.58;    // of the height
+constexpr double PaddingPart = 0.3;  // of the height, each side
+constexpr double RoundedPart = 0.22; // corner radius of trams, buses and neutral shields
+constexpr double SquarePart = 0.1;   // of rail
+constexpr qsizetype DiscCharacters = 2;
+constexpr double VisibleContrast = 1.6; // between shield and card; below it a hairline helps
+
+// Laid out large and scaled down: font sizes of the toolkit are whole pixels, a path's are not.
+constexpr int LayoutPixels = 128;
+
+struct Colours {
+    QColor background;
+    QColor text;
+};
+
+QColor cardColour(bool nightMode) {
+    return nightMode ? QColor(0x1E, 0x1E, 0x22) : QColor(0xF4, 0xF4, 0xF6);
+}
+QColor secondaryColour(bool nightMode) {
+    return nightMode ? QColor(0xA9, 0xA9, 0xB2) : QColor(0x5B, 0x5B, 0x63);
+}
+
+Colours neutralColours(bool nightMode) {
+    const QColor light(0xE3, 0xE3, 0xE8);
+    const QColor dark(0x3A, 0x3A, 0x40);
+    return nightMode ? Colours{dark, light} : Colours{light, dark};
+}
+
+/// Relative luminance and contrast by WCAG 2.
+double luminance(const QColor& colour) {
+    const auto linear = [](double part) {
+        return part <= 0.04045 ? part / 12.92 : std::pow((part + 0.055) / 1.055, 2.4);
+    };
+    return 0.2126 * linear(colour.redF()) + 0.7152 * linear(colour.greenF()) +
+           0.0722 * linear(colour.blueF());
+}
+
+double contrast(const QColor& a, const QColor& b) {
+    const auto [darker, lighter] = std::minmax({luminance(a), luminance(b)});
+    return (lighter + 0.05) / (darker + 0.05);
+}
+
+/// `RRGGBB` or `RRGGBB,RRGGBB`; neutral for anything else.
+Colours coloursOf(const TransitShieldDataSource& shield, bool nightMode) {
+    const auto parts = QString::fromStdString(shield.shieldColorString().value_or("")).split(',');
+    const QColor background("#" + parts.first());
+    if (parts.first().size() != 6 || !background.isValid())
+        return neutralColours(nightMode);
+    const QColor given = parts.size() > 1 ? QColor("#" + parts[1]) : QColor();
+    if (given.isValid())
+        return {background, given};
+    return {background,
+            contrast(background, Qt::white) >= contrast(background, Qt::black) ? Qt::white
+                                                                               : Qt::black};
+}
+
+QFont shieldFont() {
+    static const QString family = [] {
+        const int identifier =
+            QFontDatabase::addApplicationFont("/usr/share/fonts/opentype/inter/Inter-SemiBold.otf");
+        const auto families = QFontDatabase::applicationFontFamilies(identifier);
+        return families.isEmpty() ? QString() : families.first();
+    }();
+    QFont font(family);
+    font.setPixelSize(LayoutPixels);
+    font.setWeight(QFont::DemiBold);
+    font.setHintingPreference(QFont::PreferNoHinting);
+    return font;
+}
+
+/// The text as a shape whose capitals stand `capHeight`-centred around y = 0, from x = 0.
+struct TextShape {
+    QPainterPath path;
+    double width;
+};
+
+TextShape textShape(const QString& text, double height) {
+    const auto font = shieldFont();
+    const QFontMetricsF metrics(font);
+    QPainterPath path;
+    path.addText(0, metrics.capHeight() / 2, font, text);
+    const double factor = height * TextPart / LayoutPixels;
+    return {QTransform::fromScale(factor, factor).map(path),
+            metrics.horizontalAdvance(text) * factor};
+}
+
+double cornerRadius(TransitShieldType type, const QString& text, double width, double height) {
+    switch (type) {
+    case TransitShieldType::Metro:
+        return text.size() <= DiscCharacters ? std::min(width, height) / 2 : height / 2;
+    case TransitShieldType::Ferry:
+    case TransitShieldType::Cable:
+        return height / 2;
+    case TransitShieldType::Rail:
+        return height * SquarePart;
+    case TransitShieldType::Neutral:
+    case TransitShieldType::Tram:
+    case TransitShieldType::Bus:
+        break;
+    }
+    return height * RoundedPart;
+}
+
+std::shared_ptr<UIImage> imageOf(const QImage& image, double scale) {
+    std::vector<std::uint32_t> pixels;
+    pixels.reserve(static_cast<std::size_t>(image.width()) *
+                   static_cast<std::size_t>(image.height()));
+    for (int row = 0; row < image.height(); ++row) {
+        const auto* line = reinterpret_cast<const std::uint32_t*>(image.constScanLine(row));
+        pixels.insert(pixels.end(), line, line + image.width());
+    }
+    return UIImage::imageWithPixels_size_scale(
+        std::move(pixels), {image.width() / scale, image.height() / scale}, scale);
+}
+
+} // namespace
+
+std::shared_ptr<UIImage>
+draw(const TransitShieldDataSource& shield, std::int64_t shieldSize, double scale, bool nightMode) {
+    const auto text = QString::fromStdString(shield.shieldText().value_or(""));
+    if (text.isEmpty() || !qobject_cast<QGuiApplication*>(QCoreApplication::instance()))
+        return nullptr;
+    const double height = Heights[std::clamp<std::int64_t>(
+        shieldSize, 0, static_cast<std::int64_t>(std::size(Heights)) - 1)];
+    const auto shape = textShape(text, height);
+    const auto type = static_cast<TransitShieldType>(shield.shieldType());
+    const bool isDisc = type == TransitShieldType::Metro && text.size() <= DiscCharacters;
+    const double wanted =
+        isDisc ? height : std::max(height, shape.width + 2 * PaddingPart * height);
+    const int columns = static_cast<int>(std::ceil(wanted * scale));
+    const int rows = static_cast<int>(std::lround(height * scale));
+
+    QImage image(columns, rows, QImage::Format_ARGB32_Premultiplied);
+    image.fill(Qt::transparent);
+    QPainter painter(&image);
+    painter.setRenderHint(QPainter::Antialiasing);
+    painter.scale(scale, scale);
+    const auto colours = coloursOf(shield, nightMode);
+    const double width = columns / scale;
+    const double radius = cornerRadius(type, text, width, height);
+    painter.setPen(Qt::NoPen);
+    painter.setBrush(colours.background);
+    painter.drawRoundedRect(QRectF(0, 0, width, height), radius, radius);
+    if (contrast(colours.background, cardColour(nightMode)) < VisibleContrast) {
+        const double hairline = 1 / scale;
+        painter.setPen(QPen(secondaryColour(nightMode), hairline));
+        painter.setBrush(Qt::NoBrush);
+        painter.drawRoundedRect(
+            QRectF(hairline / 2, hairline / 2, width - hairline, height - hairline),
+            radius,
+            radius);
+    }
+    // A text too wide for its disc shrinks into it.
+    const double room = width - 2 * 0.12 * height;
+    const double shrink = std::min(1.0, room / std::max(shape.width, 1.0));
+    painter.translate(width / 2, height / 2);
+    painter.scale(shrink, shrink);
+    painter.translate(-shape.width / 2, 0);
+    painter.fillPath(shape.path, colours.text);
+    painter.end();
+    return imageOf(image, scale);
+}
+
+} // namespace orvo::ShieldPainter

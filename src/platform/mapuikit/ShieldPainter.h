@@ -1,0 +1,21 @@
+#pragma once
+
+#include "platform/geoservices/TransitShieldDataSource.h"
+#include "platform/uikit/UIImage.h"
+
+#include <cstdint>
+#include <memory>
+
+namespace orvo::ShieldPainter {
+
+/// The shields' heights in points, by size 0 to 7.
+inline constexpr double Heights[] = {12, 14, 16, 18, 20, 22, 25, 28};
+
+/// Draws a shield in the shape of its mode and the colours of its line: at least as wide as high,
+/// its edges on whole device pixels, its text centred on the height of capitals. A shield without
+/// colours is neutral; one that the card would nearly swallow gets a hairline around it. Nil
+/// without a text, or where the program has no graphical application object.
+[[nodiscard]] std::shared_ptr<UIImage>
+draw(const TransitShieldDataSource& shield, std::int64_t shieldSize, double scale, bool nightMode);
+
+} // namespace orvo::ShieldPainter

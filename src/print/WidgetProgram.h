@@ -1,0 +1,64 @@
+#pragma once
+
+#include "orvo/console/ExitCode.h"
+#include "orvo/console/Terminal.h"
+#include "platform/demo/DemoVisit.h"
+#include "platform/extension/Extension.h"
+#include "platform/foundation/Environment.h"
+#include "platform/foundation/Text.h"
+#include "platform/uikit/UITraitCollection.h"
+#include "print/WidgetOptions.h"
+#include "print/WidgetPrinter.h"
+
+#include <memory>
+#include <optional>
+#include <string>
+#include <vector>
+
+namespace orvo {
+
+class WidgetScene;
+
+/// The widget's program on the command line. What the options say of profile, clock and language
+/// holds while it lives. Main thread.
+class WidgetProgram {
+public:
+    /// Runs that extension, which is the transit widget.
+    WidgetProgram(Extension extension, Terminal terminal);
+    WidgetProgram(const WidgetProgram&) = delete;
+    WidgetProgram& operator=(const WidgetProgram&) = delete;
+
+    /// The words of the command line without the program's name.
+    [[nodiscard]] ExitCode run(const std::vector<std::string>& words);
+
+private:
+    /// Turns the environment; false, with the reason said, when that fails.
+    [[nodiscard]] bool applyEnvironment(const WidgetOptions& options);
+    [[nodiscard]] std::unique_ptr<WidgetScene> scene(const WidgetOptions& options) const;
+    /// The same, with what a fetch has brought.
+    [[nodiscard]] std::unique_ptr<WidgetScene> updatedScene(const WidgetOptions& options) const;
+    [[nodiscard]] ExitCode print(const WidgetOptions& options) const;
+    /// Until a signal asks it to end, or nobody reads any more.
+    [[nodiscard]] ExitCode follow(const WidgetOptions& options);
+    [[nodiscard]] ExitCode open(const WidgetOptions& options) const;
+    /// A picture or a dump.
+    [[nodiscard]] ExitCode draw(const WidgetOptions& options) const;
+    [[nodiscard]] ExitCode fail(const std::string& reason) const;
+
+    /// Before each update that follows: the demonstration goes on when its hour is over. What fails
+    /// is said once.
+    void renewDemonstration();
+    [[nodiscard]] std::unique_ptr<WidgetPrinter> printer(const WidgetOptions& options) const;
+
+    Extension _extension;
+    Terminal _terminal;
+    std::optional<EnvironmentSlot<std::shared_ptr<WallClock>>::Override> _clock;
+    std::optional<EnvironmentSlot<bool>::Override> _keepsWritesInMemory;
+    std::optional<EnvironmentSlot<std::string>::Override> _language;
+    std::optional<EnvironmentSlot<UITraitCollection>::Override> _traits;
+    std::string _saidOfDemonstration;
+    std::unique_ptr<DemoVisit> _demonstration; ///< nil on the person's own profile
+    EnvironmentSlot<bool>::Override _checksSchedules;
+};
+
+} // namespace orvo

@@ -1,0 +1,105 @@
+#include "platform/extension/WidgetCard.h"
+
+#include "platform/extension/ScriptedWidget.h"
+#include "platform/foundation/NSBundle.h"
+#include "platform/foundation/Text.h"
+#include "support/FixedTextMeasurer.h"
+#include "support/RecordingCanvas.h"
+
+#include <gtest/gtest.h>
+
+namespace orvo {
+namespace {
+
+using testing::Mode;
+
+class WidgetCardTest : public ::testing::Test, protected testing::HostWorld {
+protected:
+    std::shared_ptr<WidgetCard> shownCard(bool offersButton = true) {
+        held = host();
+        held->setShown(true);
+        auto card = WidgetCard::cardWithHost_offersButton(held, offersButton);
+        card->layoutIfNeeded();
+        return card;
+    }
+
+    EnvironmentSlot<std::shared_ptr<TextMeasurer>>::Override measurer =
+        TextMeasurer::shared().overrideWith(std::make_shared<testing::FixedTextMeasurer>());
+    EnvironmentSlot<UITraitCollection>::Override traits =
+        UITraitCollection::system().overrideWith({});
+    EnvironmentSlot<std::shared_ptr<NSBundle>>::Override bundle =
+        NSBundle::main().overrideWith(NSBundle::bundleWithPath(ORVO_TEST_RESOURCES));
+    EnvironmentSlot<std::string>::Override language = Text::locale().overrideWith("en");
+    std::shared_ptr<WidgetHost> held;
+};
+
+TEST_F(WidgetCardTest, TheWidgetStandsUnderTheHeader) {
+    const auto card = shownCard();
+    EXPECT_EQ(card->frame().size, CGSize(359, 146));
+    EXPECT_EQ(held->view()->frame(), CGRect({0, 36}, {359, 110}));
+    EXPECT_EQ(held->view()->superview(), card);
+}
+
+TEST_F(WidgetCardTest, OffersTheOtherModeOnlyWhereThereIsMore) {
+    const auto card = shownCard();
+    EXPECT_EQ(card->buttonTitle(), "Show More");
+    EXPECT_GE(card->buttonArea().size.width, 44);
+    EXPECT_EQ(card->buttonArea().size.height, 36);
+    EXPECT_EQ(card->buttonArea().origin.x + card->buttonArea().size.width, 359);
+    widget->largest = Mode::Compact;
+    widget->offer();
+    card->update();
+    EXPECT_EQ(card->buttonArea(), CGRect());
+    card->pressButton();
+    EXPECT_EQ(held->displayMode(), Mode::Compact);
+}
+
+TEST_F(WidgetCardTest, ThePressedButtonChangesTheModeAndItsWords) {
+    const auto card = shownCard();
+    card->pressButton();
+    EXPECT_EQ(held->displayMode(), Mode::Expanded);
+    card->update();
+    EXPECT_EQ(card->buttonTitle(), "Show Less");
+    card->pressButton();
+    EXPECT_EQ(held->displayMode(), Mode::Compact);
+}
+
+TEST_F(WidgetCardTest, APicturesHeaderHasNoButton) {
+    EXPECT_EQ(shownCard(false)->buttonArea(), CGRect());
+}
+
+TEST_F(WidgetCardTest, TheHeaderIsMirroredWhereOneReadsFromTheRight) {
+    UITraitCollection::system().set(
+        {.layoutDirection = UIUserInterfaceLayoutDirection::RightToLeft});
+    const auto card = shownCard();
+    EXPECT_EQ(card->buttonArea().origin, CGPoint(0, 0));
+    const auto icon = card->subviews().front()->frame();
+    EXPECT_EQ(icon.origin.x + icon.size.width, 359 - 16);
+}
+
+TEST_F(WidgetCardTest, ALongNameGivesWayToTheButton) {
+    const auto card = shownCard();
+    held->setWidth(200);
+    card->setFrame({{0, 0}, {200, 146}});
+    card->layoutIfNeeded();
+    const auto name = card->subviews()[1]->frame();
+    EXPECT_LE(name.origin.x + name.size.width, card->subviews()[2]->frame().origin.x - 16);
+}
+
+TEST_F(WidgetCardTest, HasABorderWithMoreContrastOnly) {
+    const auto card = shownCard();
+    const auto strokes = [&] {
+        testing::RecordingCanvas canvas;
+        card->drawRect(canvas);
+        return canvas.drawn.size();
+    };
+    EXPECT_EQ(strokes(), 0U);
+    card->setTraitCollection(
+        UITraitCollection{.accessibilityContrast = UIAccessibilityContrast::High});
+    EXPECT_EQ(strokes(), 1U);
+    card->setButtonFocused(true);
+    EXPECT_EQ(strokes(), 2U) << "and the ring";
+}
+
+} // namespace
+} // namespace orvo

@@ -1,0 +1,316 @@
+#include "platform/feeds/alerts/EntityReader.h"
+
+#include "AlertMaker.h"
+
+#include <gtest/gtest.h>
+
+namespace orvo::testing {
+
+namespace {
+
+/// An entity read, with the bytes that the answer views.
+struct Reading {
+    std::string bytes;
+    AlertStatistics statistics;
+    AlertReading reading;
+
+    explicit Reading(const Wire& entity)
+        : bytes(entity.str())
+        , reading(EntityReader(statistics).read(bytes)) {}
+    Reading(const Reading&) = delete;
+    Reading& operator=(const Reading&) = delete;
+    ~Reading() = default;
+
+    const Alert& alert() const { return reading.alert.value(); }
+    std::uint64_t count(AlertCount reason) const { return statistics.count(reason); }
+};
+
+AlertMaker with(const Wire& more) {
+    AlertMaker maker;
+    maker.more = more;
+    return maker;
+}
+
+AlertMaker withSelector(const Wire& selector) {
+    AlertMaker maker;
+    maker.selectors = {selector, route("R2")};
+    return maker;
+}
+
+const std::string BadText = "caf\xE9";
+
+} // namespace
+
+TEST(EntityReader, ReadsEveryField) {
+    AlertMaker maker;
+    maker.id = "a7";
+    maker.activePeriods = {period(1, 2)};
+    maker.communicationPeriods = {period(3, 0)};
+    maker.impactPeriods = {period(0, 4)};
+    maker.selectors = {Wire().bytes(1, "A").bytes(2, "R").number(3, 0).bytes(5, "S"),
+                       Wire().bytes(4, Wire().bytes(1, "T").bytes(2, "08:00").bytes(5, "TR"))};
+    maker.cause = 4;
+    maker.effect = 1;
+    maker.severity = 3;
+    maker.spokenHeader = {{"spoken", ""}};
+    maker.link = {{"https://example.invalid", "fr"}};
+    const Reading read(maker.entity());
+    const Alert& alert = read.alert();
+    EXPECT_EQ(alert.id, "a7");
+    EXPECT_EQ(alert.activePeriods.at(0).start, 1U);
+    EXPECT_EQ(alert.activePeriods.at(0).end, 2U);
+    EXPECT_EQ(alert.communicationPeriods.at(0).end, std::nullopt);
+    EXPECT_EQ(alert.impactPeriods.at(0).start, std::nullopt);
+    EXPECT_EQ(alert.selectors.at(0).agencyId, "A");
+    EXPECT_EQ(alert.selectors.at(0).routeId, "R");
+    EXPECT_EQ(alert.selectors.at(0).routeType, 0);
+    EXPECT_EQ(alert.selectors.at(0).stopId, "S");
+    EXPECT_EQ(alert.selectors.at(1).tripId, "T");
+    EXPECT_TRUE(alert.selectors.at(1).namesDeparture);
+    EXPECT_EQ(alert.selectors.at(1).tripRouteId, "TR");
+    EXPECT_EQ(alert.selectors.at(1).routeType, std::nullopt);
+    EXPECT_EQ(alert.cause, 4);
+    EXPECT_EQ(alert.effect, 1);
+    EXPECT_EQ(alert.severity, 3);
+    EXPECT_EQ(alert.header.at(0).text, "Trams turn early");
+    EXPECT_EQ(alert.header.at(0).language, "en");
+    EXPECT_EQ(alert.spokenHeader.at(0).language, "");
+    EXPECT_EQ(alert.link.at(0).text, "https://example.invalid");
+    EXPECT_FALSE(read.reading.mayConcernAnyLine);
+    EXPECT_EQ(read.statistics.unreadable(), 0U);
+}
+
+TEST(EntityReader, DefaultsAreThoseOfTheFormat) {
+    AlertMaker maker;
+    maker.effect = 0;
+    const Reading read(maker.entity());
+    EXPECT_EQ(read.alert().cause, 1);
+    EXPECT_EQ(read.alert().effect, 8);
+    EXPECT_EQ(read.alert().severity, 1);
+}
+
+TEST(EntityReader, DeletedEntitiesAreSkippedWhereverTheySaySo) {
+    const Reading before(Wire().number(2, 1).raw(AlertMaker().entity().str()));
+    const Reading after(AlertMaker().entity().number(2, 1));
+    EXPECT_FALSE(before.reading.alert);
+    EXPECT_FALSE(after.reading.alert);
+    EXPECT_FALSE(after.reading.mayConcernAnyLine);
+    EXPECT_EQ(after.count(AlertCount::DeletedEntities), 1U);
+    EXPECT_TRUE(Reading(AlertMaker().entity().number(2, 0)).reading.alert);
+}
+
+TEST(EntityReader, TripUpdatesAndVehiclesAreNoAlerts) {
+    const Reading trip(Wire().bytes(1, "t").bytes(3, "whatever this is"));
+    const Reading vehicle(Wire().bytes(1, "v").bytes(4, ""));
+    EXPECT_FALSE(trip.reading.alert);
+    EXPECT_FALSE(trip.reading.mayConcernAnyLine);
+    EXPECT_EQ(trip.count(AlertCount::OtherEntities), 1U);
+    EXPECT_FALSE(vehicle.reading.alert);
+}
+
+TEST(EntityReader, ABadIdCostsOnlyTheId) {
+    AlertMaker maker;
+    maker.id = BadText;
+    const Reading read(maker.entity());
+    EXPECT_EQ(read.alert().id, "");
+    EXPECT_EQ(read.count(AlertCount::UnreadableIds), 1U);
+    EXPECT_EQ(read.alert().selectors.size(), 1U);
+}
+
+TEST(EntityReader, ABadPeriodIsCountedAndLeavesOpenWhenTheAlertHolds) {
+    AlertMaker maker = with(Wire().number(1, 5));
+    maker.activePeriods = {Wire().raw("\x08"), period(1, 2)};
+    const Reading read(maker.entity());
+    EXPECT_EQ(read.alert().activePeriods.size(), 3U);
+    EXPECT_EQ(read.count(AlertCount::UnreadablePeriods), 2U);
+    EXPECT_FALSE(read.reading.mayConcernAnyLine);
+}
+
+TEST(EntityReader, ABadTextCostsOnlyThatTranslation) {
+    AlertMaker maker;
+    maker.header = {{BadText, "fr"}, {"good", "en"}};
+    const Reading read(maker.entity());
+    ASSERT_EQ(read.alert().header.size(), 1U);
+    EXPECT_EQ(read.alert().header[0].text, "good");
+    EXPECT_EQ(read.count(AlertCount::UnreadableTexts), 1U);
+}
+
+TEST(EntityReader, ABadLanguageCostsOnlyTheTag) {
+    AlertMaker maker;
+    maker.header = {{"good", BadText}};
+    const Reading read(maker.entity());
+    EXPECT_EQ(read.alert().header.at(0).language, "");
+    EXPECT_EQ(read.count(AlertCount::UnreadableTexts), 1U);
+}
+
+TEST(EntityReader, BlankTextsAreNone) {
+    AlertMaker maker;
+    maker.header = {{"", "fr"}, {" \n", "de"}, {"good", "en"}};
+    const Reading read(maker.entity());
+    EXPECT_EQ(read.alert().header.size(), 1U);
+    EXPECT_EQ(read.count(AlertCount::UnreadableTexts), 0U);
+}
+
+TEST(EntityReader, UnlistedAndBadNumbersLeaveTheDefault) {
+    AlertMaker maker = with(Wire().bytes(6, "x").number(14, 99));
+    maker.effect = 12;
+    const Reading read(maker.entity());
+    EXPECT_EQ(read.alert().cause, 1);
+    EXPECT_EQ(read.alert().effect, 8);
+    EXPECT_EQ(read.alert().severity, 1);
+    EXPECT_EQ(read.count(AlertCount::UnreadableNumbers), 3U);
+}
+
+TEST(EntityReader, AnUnreadableSelectorLeavesTheOthersAndMayConcernAnyLine) {
+    const std::vector<Wire> bad = {
+        Wire().bytes(2, BadText),
+        Wire().bytes(1, "A1").bytes(5, BadText),
+        Wire().number(2, 7),
+        Wire().bytes(3, "bus"),
+        Wire().number(4, 7),
+        Wire().bytes(4, Wire().number(5, 7)),
+        Wire().bytes(2, "R1").raw("\x2A\x05S"),
+        Wire().raw("\xFF\xFF"),
+    };
+    for (const Wire& selector : bad) {
+        const Reading read(withSelector(selector).entity());
+        ASSERT_EQ(read.alert().selectors.size(), 1U);
+        EXPECT_EQ(read.alert().selectors[0].routeId, "R2");
+        EXPECT_TRUE(read.reading.mayConcernAnyLine);
+        EXPECT_EQ(read.count(AlertCount::UnreadableSelectors), 1U);
+    }
+}
+
+TEST(EntityReader, ASelectorOfTheWrongWireTypeMayConcernAnyLine) {
+    const Reading read(with(Wire().number(5, 1)).entity());
+    EXPECT_TRUE(read.reading.mayConcernAnyLine);
+    EXPECT_EQ(read.alert().selectors.size(), 1U);
+}
+
+TEST(EntityReader, AGroupIsTheWrongTypeOfEveryKnownFieldOfASelector) {
+    for (std::uint32_t field = 1; field <= 5; ++field) {
+        const Reading read(withSelector(route("R1").group(field)).entity());
+        EXPECT_EQ(read.alert().selectors.size(), 1U) << field;
+        EXPECT_TRUE(read.reading.mayConcernAnyLine) << field;
+        EXPECT_EQ(read.count(AlertCount::UnreadableSelectors), 1U) << field;
+    }
+    const Reading whole(with(Wire().group(5)).entity());
+    EXPECT_TRUE(whole.reading.mayConcernAnyLine);
+}
+
+TEST(EntityReader, AGroupAsAnAlertMayConcernAnyLine) {
+    const Reading read(Wire().bytes(1, "x").group(5));
+    EXPECT_TRUE(read.reading.mayConcernAnyLine);
+    EXPECT_EQ(read.count(AlertCount::UnreadableAlerts), 1U);
+}
+
+TEST(EntityReader, AGroupAsAnyOtherFieldIsCountedAndCostsOnlyThatField) {
+    AlertMaker maker = with(Wire().group(6).group(7).group(14));
+    maker.activePeriods = {period(1, 2).group(2)};
+    maker.header = {{"good", "en"}};
+    const Reading read(maker.entity().group(1).group(2));
+    EXPECT_EQ(read.count(AlertCount::UnreadableNumbers), 4U);
+    EXPECT_EQ(read.count(AlertCount::UnreadablePeriods), 1U);
+    EXPECT_EQ(read.count(AlertCount::UnreadableIds), 1U);
+    EXPECT_EQ(read.alert().effect, 4);
+    EXPECT_FALSE(read.reading.mayConcernAnyLine);
+    const Reading texts(with(Wire().group(10).bytes(11, Wire().group(1))).entity());
+    EXPECT_EQ(texts.count(AlertCount::UnreadableTexts), 2U);
+}
+
+TEST(EntityReader, APeriodThatIsAGroupLeavesOpenWhenTheAlertHolds) {
+    AlertMaker maker = with(Wire().group(1));
+    maker.activePeriods = {period(1, 2)};
+    const Reading read(maker.entity());
+    ASSERT_EQ(read.alert().activePeriods.size(), 2U);
+    EXPECT_EQ(read.alert().activePeriods[1].start, std::nullopt);
+    EXPECT_EQ(read.alert().activePeriods[1].end, std::nullopt);
+}
+
+TEST(EntityReader, ATripWhoseFieldsAreOfTheWrongTypeMayMeanAnyLine) {
+    for (const Wire& trip : {Wire().bytes(5, "R1").number(1, 7),
+                             Wire().bytes(5, "R1").number(2, 8),
+                             Wire().bytes(1, "T1").number(5, 7),
+                             Wire().bytes(1, "T1").group(5)}) {
+        const Reading read(withSelector(Wire().bytes(4, trip)).entity());
+        EXPECT_EQ(read.alert().selectors.size(), 1U);
+        EXPECT_TRUE(read.reading.mayConcernAnyLine);
+    }
+    const Reading date(withSelector(Wire().bytes(4, Wire().bytes(5, "R1").number(3, 7))).entity());
+    EXPECT_EQ(date.alert().selectors.size(), 2U);
+    EXPECT_FALSE(date.reading.mayConcernAnyLine);
+}
+
+TEST(EntityReader, ABadDirectionNarrowsNothing) {
+    const Reading read(withSelector(route("R1").bytes(6, "in")).entity());
+    EXPECT_EQ(read.alert().selectors.size(), 2U);
+    EXPECT_FALSE(read.reading.mayConcernAnyLine);
+}
+
+TEST(EntityReader, EmptySelectorsAreCountedAndDropped) {
+    for (const Wire& selector :
+         {Wire(), Wire().bytes(2, "").bytes(5, ""), Wire().number(6, 1), Wire().bytes(4, "")}) {
+        const Reading read(withSelector(selector).entity());
+        EXPECT_EQ(read.alert().selectors.size(), 1U);
+        EXPECT_EQ(read.count(AlertCount::EmptySelectors), 1U);
+        EXPECT_FALSE(read.reading.mayConcernAnyLine);
+    }
+}
+
+TEST(EntityReader, AnAlertThatBreaksOffKeepsWhatStoodBefore) {
+    const Reading read(with(Wire().raw("\x52\x7F")).entity());
+    EXPECT_EQ(read.alert().selectors.size(), 1U);
+    EXPECT_EQ(read.alert().header.size(), 1U);
+    EXPECT_TRUE(read.reading.mayConcernAnyLine);
+    EXPECT_EQ(read.count(AlertCount::UnreadableAlerts), 1U);
+}
+
+TEST(EntityReader, AnEntityThatBreaksOffMayConcernAnyLine) {
+    const Reading before(Wire().bytes(1, "x").raw("\x2A\x7F"));
+    EXPECT_FALSE(before.reading.alert);
+    EXPECT_TRUE(before.reading.mayConcernAnyLine);
+    const Reading after(AlertMaker().entity().raw("\x2A"));
+    EXPECT_TRUE(after.reading.alert);
+    EXPECT_TRUE(after.reading.mayConcernAnyLine);
+    EXPECT_EQ(after.count(AlertCount::UnreadableEntities), 1U);
+}
+
+TEST(EntityReader, CutAtEveryByteItAlwaysSaysThatSomethingIsMissing) {
+    const std::string whole = AlertMaker().entity().str();
+    const std::size_t afterId = 3;
+    for (std::size_t length = 1; length < whole.size(); ++length) {
+        const Reading read(Wire().raw(whole.substr(0, length)));
+        EXPECT_EQ(read.reading.mayConcernAnyLine, length != afterId) << length;
+    }
+}
+
+TEST(EntityReader, AnAlertGivenInTwoPartsIsOne) {
+    AlertMaker second;
+    second.selectors = {route("R2")};
+    second.header.clear();
+    const Reading read(AlertMaker().entity().bytes(5, second.alert()));
+    EXPECT_EQ(read.alert().selectors.size(), 2U);
+    EXPECT_EQ(read.alert().header.size(), 1U);
+}
+
+TEST(EntityReader, ExtensionsAreSteppedOver) {
+    const Reading read(with(Wire()
+                                .bytes(1104,
+                                       "\x0A\x01"
+                                       "0")
+                                .key(1500, 3)
+                                .key(1500, 4))
+                           .entity());
+    EXPECT_EQ(read.statistics.unreadable(), 0U);
+    EXPECT_FALSE(read.reading.mayConcernAnyLine);
+}
+
+TEST(EntityReader, TranslationsHaveALimit) {
+    AlertMaker maker;
+    maker.header.assign(300, {"text", "en"});
+    const Reading read(maker.entity());
+    EXPECT_EQ(read.alert().header.size(), 200U);
+    EXPECT_EQ(read.count(AlertCount::UnreadableTexts), 100U);
+}
+
+} // namespace orvo::testing

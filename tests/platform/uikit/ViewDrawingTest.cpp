@@ -1,0 +1,201 @@
+#include "platform/uikit/ViewDrawing.h"
+
+#include "ViewTest.h"
+#include "platform/uikit/UIColor.h"
+#include "platform/uikit/UIImage.h"
+#include "platform/uikit/UIImageDrawing.h"
+#include "platform/uikit/UIImageView.h"
+#include "platform/uikit/UIVisualEffectView.h"
+#include "platform/uikit/drawing/Canvas.h"
+
+namespace orvo {
+namespace {
+
+/// Writes down what is drawn, in the coordinates of the screen.
+class RecordingCanvas final : public Canvas {
+public:
+    std::vector<std::string> drawn;
+
+    double scale() const override { return 2; }
+    void save() override { _origins.push_back(_origins.back()); }
+    void restore() override { _origins.pop_back(); }
+    void translate(double x, double y) override {
+        _origins.back().x += x;
+        _origins.back().y += y;
+    }
+    void clip(const CGRect& rect, double) override { write("clip", rect); }
+    void fade(double alpha) override { drawn.push_back("fade " + number(alpha)); }
+    void fill(const CGRect& rect, double radius, RGBA color) override {
+        write("fill radius " + number(radius) + " " + hex(color), rect);
+    }
+    void stroke(const CGRect& rect, double, double, RGBA color) override {
+        write("stroke " + hex(color), rect);
+    }
+    void text(const TextLine& line, CGPoint baseline, RGBA color) override {
+        write("text " + line.text + " " + hex(color), {baseline, {line.width, 0}});
+    }
+    void pixels(std::span<const std::uint32_t>,
+                int columns,
+                int rows,
+                const CGRect& rect,
+                const RGBA* tint) override {
+        write("pixels " + std::to_string(columns) + "x" + std::to_string(rows) +
+                  (tint ? " " + hex(*tint) : ""),
+              rect);
+    }
+    void fixedImage(std::string_view name, const CGRect& rect, RGBA color) override {
+        write("image " + std::string(name) + " " + hex(color), rect);
+    }
+
+private:
+    static std::string number(double value) {
+        char text[32];
+        std::snprintf(text, sizeof text, "%g", value);
+        return text;
+    }
+    static std::string hex(RGBA color) {
+        char text[16];
+        std::snprintf(text, sizeof text, "%02X%02X%02X", color.red, color.green, color.blue);
+        return text;
+    }
+    void write(const std::string& what, const CGRect& rect) {
+        drawn.push_back(what + " at " + number(rect.origin.x + _origins.back().x) + " " +
+                        number(rect.origin.y + _origins.back().y) + " " + number(rect.size.width) +
+                        " " + number(rect.size.height));
+    }
+    std::vector<CGPoint> _origins{CGPoint()};
+};
+
+class DrawingTest : public testing::ViewTest {
+protected:
+    using Lines = std::vector<std::string>;
+    static Lines draw(const std::shared_ptr<UIView>& view) {
+        view->layoutIfNeeded();
+        RecordingCanvas canvas;
+        drawViewHierarchy(*view, canvas);
+        return canvas.drawn;
+    }
+};
+
+TEST_F(DrawingTest, BackgroundThenContentThenSubviewsInOrder) {
+    const auto card = root(100, 50);
+    card->setBackgroundColor(UIColor::cardColor());
+    card->setCornerRadius(14);
+    const auto text = label(card, "text", "hello");
+    place(text, 10, 20);
+    EXPECT_EQ(draw(card),
+              (Lines{"fill radius 14 F4F4F6 at 0 0 100 50", "text hello 17171A at 10 28 25 0"}));
+}
+
+TEST_F(DrawingTest, HiddenAndTransparentViewsAreLeftOut) {
+    const auto card = root(100, 50);
+    const auto hidden = label(card, "hidden", "hidden");
+    const auto clear = label(card, "clear", "clear");
+    const auto faint = label(card, "faint", "faint");
+    place(hidden, 0, 0);
+    place(clear, 0, 0);
+    place(faint, 0, 0);
+    hidden->setHidden(true);
+    clear->setAlpha(0);
+    faint->setAlpha(0.5);
+    EXPECT_EQ(draw(card), (Lines{"fade 0.5", "text faint 17171A at 0 8 25 0"}));
+}
+
+TEST_F(DrawingTest, ScrolledAndClippedContent) {
+    const auto scroller = root(100, 50);
+    scroller->setClipsToBounds(true);
+    const auto text = label(nullptr, "text", "hello");
+    text->setTranslatesAutoresizingMaskIntoConstraints(true);
+    text->setFrame({{0, 60}, {100, 10}});
+    scroller->addSubview(text);
+    scroller->setBounds({{0, 40}, {100, 50}});
+    EXPECT_EQ(draw(scroller), (Lines{"clip at 0 0 100 50", "text hello 17171A at 0 28 25 0"}));
+}
+
+TEST_F(DrawingTest, AlignmentFollowsTheDirectionOfReading) {
+    const auto drawn = [](NSTextAlignment alignment, UIUserInterfaceLayoutDirection direction) {
+        const auto card = root(100, 10);
+        card->setTraitCollection(UITraitCollection{.layoutDirection = direction});
+        const auto text = label(card, "text", "hello");
+        text->setTextAlignment(alignment);
+        pin(text, card);
+        return draw(card).front();
+    };
+    using enum UIUserInterfaceLayoutDirection;
+    EXPECT_EQ(drawn(NSTextAlignment::Natural, LeftToRight), "text hello 17171A at 0 8 25 0");
+    EXPECT_EQ(drawn(NSTextAlignment::Natural, RightToLeft), "text hello 17171A at 75 8 25 0");
+    EXPECT_EQ(drawn(NSTextAlignment::Left, RightToLeft), "text hello 17171A at 0 8 25 0");
+    EXPECT_EQ(drawn(NSTextAlignment::Center, LeftToRight), "text hello 17171A at 37.5 8 25 0");
+    EXPECT_EQ(drawn(NSTextAlignment::Right, LeftToRight), "text hello 17171A at 75 8 25 0");
+}
+
+TEST_F(DrawingTest, VibrancyGivesTextsAndImagesItsColour) {
+    const auto effect =
+        UIVisualEffectView::initWithEffect(UIVibrancyEffect::widgetEffectForVibrancyStyle(102));
+    effect->setFrame({{0, 0}, {100, 24}});
+    const auto text = label(effect->contentView(), "text", "a");
+    text->setTextColor(UIColor::advisoryColor());
+    place(text, 0, 0);
+    const auto fixed = constrained(
+        UIImageView::initWithImage(UIImage::imageNamed("good-v2")), effect->contentView(), "fixed");
+    place(fixed, 20, 0);
+    const auto pixels = constrained(
+        UIImageView::initWithImage(UIImage::imageWithPixels_size_scale({1, 2, 3, 4}, {1, 1}, 2)),
+        effect->contentView(),
+        "pixels");
+    place(pixels, 50, 0);
+    EXPECT_EQ(draw(effect),
+              (Lines{"text a 5B5B63 at 0 8 5 0",
+                     "image good-v2 5B5B63 at 20 0 24 24",
+                     "pixels 2x2 5B5B63 at 50 0 1 1"}));
+}
+
+TEST_F(DrawingTest, OutsideVibrancyImagesHaveTheirOwnColourOrTheTint) {
+    const auto drawn = [](const char* name) {
+        const auto view = UIImageView::initWithImage(UIImage::imageNamed(name));
+        view->setFrame({{0, 0}, {24, 24}});
+        view->setTintColor(UIColor::advisoryColor());
+        return draw(view).front();
+    };
+    EXPECT_EQ(drawn("good-v2"), "image good-v2 1B7F3B at 0 0 24 24");
+    EXPECT_EQ(drawn("advisories-v2"), "image advisories-v2 A34A00 at 0 0 24 24");
+}
+
+TEST_F(DrawingTest, ImagesShrinkIntoTheirViewButNeverGrow) {
+    EXPECT_EQ(UIImageDrawing::placeIn({{0, 0}, {100, 100}}, {24, 24}, 1),
+              (CGRect{{38, 38}, {24, 24}}));
+    EXPECT_EQ(UIImageDrawing::placeIn({{0, 0}, {12, 100}}, {24, 24}, 1),
+              (CGRect{{0, 44}, {12, 12}}));
+    EXPECT_EQ(UIImageDrawing::placeIn({{0, 0}, {25, 24}}, {24, 24}, 2),
+              (CGRect{{0.5, 0}, {24, 24}}));
+    EXPECT_EQ(UIImageDrawing::placeIn({{1, 2}, {25, 24}}, {0, 24}, 2), (CGRect{{1, 2}, {0, 0}}));
+}
+
+TEST_F(DrawingTest, WhatChangedAsksToBeDrawnUpToTheRoot) {
+    const auto card = root(100, 50);
+    const auto text = label(child(card, "box"), "text", "a");
+    draw(card);
+    EXPECT_FALSE(card->_needsDisplay());
+    text->setText("a");
+    text->setAlpha(1);
+    EXPECT_FALSE(card->_needsDisplay());
+    text->setText("b");
+    EXPECT_TRUE(card->_needsDisplay());
+    draw(card);
+    text->setHidden(true);
+    EXPECT_TRUE(card->_needsDisplay());
+}
+
+TEST_F(DrawingTest, SnapshotHasThePixelsOfItsScale) {
+    const auto card = root(10, 5);
+    card->setBackgroundColor(UIColor::colorWithRGBA({255, 0, 0, 255}));
+    const auto image = snapshotOf(*card, 3);
+    EXPECT_EQ(image->size(), (CGSize{10, 5}));
+    EXPECT_EQ(image->scale(), 3);
+    ASSERT_EQ(image->pixels().size(), 450U);
+    EXPECT_EQ(image->pixels().front(), 0xFFFF0000);
+    EXPECT_EQ(image->pixels().back(), 0xFFFF0000);
+}
+
+} // namespace
+} // namespace orvo
