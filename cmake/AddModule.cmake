@@ -1,8 +1,8 @@
 # add_module(<folder> [THIRD_PARTY <targets>])
 #
 # One static library per folder under src/: every .h and .cpp that lies directly in it. What it may include and link is its row
-# in ModuleMap.cmake. Its headers are a header set, so that each is compiled on its own by
-# all_verify_interface_header_sets; third-party libraries are always PRIVATE, so a public header that mentions one fails there.
+# in ModuleMap.cmake. A header needs nothing before it: its source includes it first, and those without such a source are a header
+# set of their own, which all_verify_interface_header_sets compiles one by one.
 include_guard(GLOBAL)
 include(${CMAKE_CURRENT_LIST_DIR}/ModuleMap.cmake)
 
@@ -20,6 +20,23 @@ endfunction()
 function(_module_target module out)
   string(REPLACE "/" "_" target "${module}")
   set(${out} "orvo_${target}" PARENT_SCOPE)
+endfunction()
+
+# Those of `headers` that the source of the same name does not include first, when this is configured.
+function(_headers_without_source headers out)
+  set(left "")
+  foreach(header IN LISTS headers)
+    string(REGEX REPLACE "[.]h$" ".cpp" source "${header}")
+    file(RELATIVE_PATH name ${PROJECT_SOURCE_DIR}/src ${header})
+    set(first "")
+    if(EXISTS ${source})
+      file(STRINGS ${source} first REGEX "^#include" LIMIT_COUNT 1)
+    endif()
+    if(NOT first STREQUAL "#include \"${name}\"")
+      list(APPEND left ${header})
+    endif()
+  endforeach()
+  set(${out} "${left}" PARENT_SCOPE)
 endfunction()
 
 function(add_module module)
@@ -40,13 +57,19 @@ function(add_module module)
       target_link_libraries(${target} PUBLIC ${dep_target})
     endif()
   endforeach()
-  target_sources(${target} PUBLIC FILE_SET HEADERS BASE_DIRS ${PROJECT_SOURCE_DIR}/src FILES ${headers})
+  target_include_directories(${target} PUBLIC ${PROJECT_SOURCE_DIR}/src)
+  _headers_without_source("${headers}" alone)
+  if(alone)
+    target_sources(${target} PUBLIC FILE_SET HEADERS BASE_DIRS ${PROJECT_SOURCE_DIR}/src FILES ${alone})
+  endif()
   target_link_libraries(${target} PRIVATE ${arg_THIRD_PARTY} project_warnings)
   if(arg_THIRD_PARTY MATCHES "Qt6::")
     # Its words for signals and slots would be macros in every source that follows in a unity build.
     target_compile_definitions(${target} PRIVATE QT_NO_KEYWORDS)
   endif()
-  set_target_properties(${target} PROPERTIES VERIFY_INTERFACE_HEADER_SETS ON)
+  if(alone)
+    set_target_properties(${target} PROPERTIES VERIFY_INTERFACE_HEADER_SETS ON)
+  endif()
 endfunction()
 
 # add_module_tests(<folder> [LIBS …]): one executable for the tests of one folder: every .cpp that lies directly in tests/<folder>.
