@@ -37,9 +37,7 @@ public:
     ~OWTransitIncidentUpdater() override;
 
     /// The dates not reached yet, earliest first, each once. What is handed out does not change.
-    [[nodiscard]] const std::shared_ptr<NSOrderedSet>& updateDates() const noexcept {
-        return _updateDates;
-    }
+    [[nodiscard]] std::shared_ptr<NSOrderedSet> updateDates() const { return _updateDates; }
     [[nodiscard]] const std::shared_ptr<NSArray>& lineItems() const noexcept { return _lineItems; }
     [[nodiscard]] NSTimeInterval refreshInterval() const noexcept { return _refreshInterval; }
     /// Held weakly; nil at first.

@@ -9,8 +9,10 @@
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
+#include <functional>
 #include <optional>
 #include <string>
+#include <thread>
 #include <utility>
 #include <vector>
 
@@ -51,16 +53,38 @@ public:
     void
     transitIncidentUpdater_dateExpired(const std::shared_ptr<OWTransitIncidentUpdater>& updater,
                                        const std::shared_ptr<NSDate>& date) override {
+        calls.emplace_back("expired");
         expired.push_back(secondsOf(date.get()));
         pendingAtCall.push_back(updater->updateDates()->count());
+        if (const auto next = updater->_nextUpdateTimer())
+            armedAtCall.push_back(secondsOf(next->fireDate().get()));
+        if (whenExpired)
+            whenExpired(*updater);
     }
     void
     transitIncidentUpdaterNeedsRefresh(const std::shared_ptr<OWTransitIncidentUpdater>&) override {
+        calls.emplace_back("refresh");
         ++refreshes;
     }
+    std::vector<std::string> calls;
     std::vector<double> expired;
     std::vector<std::size_t> pendingAtCall;
+    std::vector<double> armedAtCall;
+    std::function<void(OWTransitIncidentUpdater&)> whenExpired;
     int refreshes = 0;
+};
+
+/// A clock that has gone on by `Step` seconds whenever it is read.
+class HurryingClock final : public WallClock {
+public:
+    static constexpr double Step = 100;
+    double timeIntervalSinceReferenceDate() const override {
+        _now += Step;
+        return _now - Step;
+    }
+
+private:
+    mutable double _now = Start - NSTimeIntervalSince1970;
 };
 
 /// An updater on a clock that the test turns, with an observer.
@@ -87,6 +111,10 @@ protected:
         for (const auto& date : updater.updateDates()->elements())
             seconds.push_back(secondsOf(date.get()));
         return seconds;
+    }
+    void expectOnlyLinesOfTheWidget() const {
+        for (const auto& record : log.records())
+            EXPECT_EQ(record.category, "TransitWidget") << record.format;
     }
     void turnClockTo(double seconds) {
         clock->setSince1970(Start + seconds);
@@ -162,9 +190,25 @@ TEST_F(OWTransitIncidentUpdaterTest, TheSameMuidWithOtherDatesCountsAgain) {
                 ElementsAre(10, 20));
 }
 
+TEST_F(OWTransitIncidentUpdaterTest, KeepsItsLinesAndItsInterval) {
+    const auto lines = NSArray::arrayWithObjects({line({})});
+    const auto made =
+        OWTransitIncidentUpdater::initWithTransitLineItems_refreshInterval(lines, 12.5);
+    updaters.push_back(made);
+    EXPECT_TRUE(equal(made->lineItems(), lines));
+    EXPECT_EQ(made->refreshInterval(), 12.5);
+    EXPECT_EQ(made->observer(), nullptr);
+}
+
+TEST_F(OWTransitIncidentUpdaterTest, AllIncidentsAreJudgedByOneMoment) {
+    const auto hurrying = Environment::wallClock().overrideWith(std::make_shared<HurryingClock>());
+    EXPECT_THAT(dates(*updaterOf({incident(50, {}), incident(60, {}), incident({}, 70)})),
+                ElementsAre(50, 60, 70));
+}
+
 TEST_F(OWTransitIncidentUpdaterTest, HandedOutDatesStayAsTheyWere) {
     const auto made = updaterOf({incident(-1, 10), incident(-1, 20)});
-    const auto before = made->updateDates();
+    const auto& before = made->updateDates();
     turnClockTo(10.5);
     EXPECT_EQ(before->count(), 2U);
     EXPECT_THAT(dates(*made), ElementsAre(20));
@@ -175,6 +219,9 @@ TEST_F(OWTransitIncidentUpdaterTest, LogsTheDatesThenArmsTheRefreshThenTheFirstD
     EXPECT_THAT(log.formats(),
                 ElementsAre("Incident updater calculated update dates for incidents: %{private}@",
                             "Scheduling incident updater  auto refresh update with interval %.2f"));
+    EXPECT_EQ(log.messages()[0],
+              "Incident updater calculated update dates for incidents: " +
+                  made->updateDates()->description());
     EXPECT_EQ(log.messages()[1],
               "Scheduling incident updater  auto refresh update with interval 1800.00");
     for (const auto& record : log.records()) {
@@ -184,6 +231,24 @@ TEST_F(OWTransitIncidentUpdaterTest, LogsTheDatesThenArmsTheRefreshThenTheFirstD
     EXPECT_EQ(secondsOf(made->_nextUpdateTimer()->fireDate().get()), 10);
     EXPECT_FALSE(made->_nextUpdateTimer()->repeats());
     EXPECT_EQ(made->_nextUpdateTimer()->userInfo(), nullptr);
+}
+
+TEST_F(OWTransitIncidentUpdaterTest, TheRefreshIsArmedBeforeTheFirstDate) {
+    const auto made = updaterOf({incident({}, Interval)}); // both at the same moment
+    turnClockTo(Interval + 1);
+    EXPECT_THAT(observer->calls, ElementsAre("refresh", "expired"));
+}
+
+TEST_F(OWTransitIncidentUpdaterTest, ItsTimersRunOnTheThreadThatMadeIt) {
+    std::size_t timers = 0;
+    std::thread([&] {
+        const auto made = OWTransitIncidentUpdater::initWithTransitLineItems_refreshInterval(
+            NSArray::arrayWithObjects({line({incident(-1, 10)})}), Interval);
+        timers = RunLoop::current().scheduledTimers();
+        made->invalidate();
+    }).join();
+    EXPECT_EQ(timers, 2U);
+    EXPECT_EQ(RunLoop::main().scheduledTimers(), 0U);
 }
 
 TEST_F(OWTransitIncidentUpdaterTest, OnlyTheRefreshMayBeLateByATenthOfItsInterval) {
@@ -211,17 +276,41 @@ TEST_F(OWTransitIncidentUpdaterTest, PastHeadDateBlocksLaterDates) {
     EXPECT_THAT(observer->expired, IsEmpty());
 }
 
+TEST_F(OWTransitIncidentUpdaterTest, AFirstDateOfNowArmsNoTimer) {
+    const auto made = updaterOf({incident(-1, 10)});
+    const auto armed = made->_nextUpdateTimer();
+    clock->setSince1970(Start + 10);
+    made->_schedulateNextUpdate();
+    EXPECT_EQ(made->_nextUpdateTimer(), armed);
+    EXPECT_EQ(RunLoop::main().scheduledTimers(), 2U);
+}
+
+TEST_F(OWTransitIncidentUpdaterTest, OfTwoDatesThatPassedMeanwhileTheSecondBlocksTheRest) {
+    const auto made = updaterOf({incident(-1, 10), incident(-1, 20), incident(-1, 30)});
+    turnClockTo(25); // the machine was asleep
+    EXPECT_THAT(observer->expired, ElementsAre(10));
+    turnClockTo(40);
+    EXPECT_THAT(observer->expired, ElementsAre(10));
+    EXPECT_THAT(dates(*made), ElementsAre(20, 30));
+    EXPECT_EQ(RunLoop::main().scheduledTimers(), 1U);
+}
+
 TEST_F(OWTransitIncidentUpdaterTest, AReachedDateIsRemovedTheNextArmedAndThenTheObserverTold) {
     const auto made = updaterOf({incident(10, 20)});
     turnClockTo(10.5);
     EXPECT_THAT(observer->expired, ElementsAre(10));
     EXPECT_THAT(observer->pendingAtCall, ElementsAre(1U));
+    EXPECT_THAT(observer->armedAtCall, ElementsAre(20));
     EXPECT_EQ(log.formats().back(), "Incident updater next update date was reached: %{private}@.");
+    EXPECT_EQ(log.messages().back(),
+              "Incident updater next update date was reached: " + date(10)->description() + ".");
+    EXPECT_EQ(log.records().back().level, LogLevel::Debug);
     EXPECT_EQ(secondsOf(made->_nextUpdateTimer()->fireDate().get()), 20);
     turnClockTo(20.5);
     EXPECT_THAT(observer->expired, ElementsAre(10, 20));
     EXPECT_THAT(dates(*made), IsEmpty());
     EXPECT_EQ(RunLoop::main().scheduledTimers(), 1U);
+    expectOnlyLinesOfTheWidget();
 }
 
 TEST_F(OWTransitIncidentUpdaterTest, AFireTakesTheFirstDateWhateverTheClockShows) {
@@ -240,6 +329,7 @@ TEST_F(OWTransitIncidentUpdaterTest, AFireWithoutDatesIsAnErrorAndGivesTheCurren
     EXPECT_EQ(log.records().back().format,
               "Incident updater next update date timer fired but we should not have any update "
               "anymore.");
+    expectOnlyLinesOfTheWidget();
 }
 
 TEST_F(OWTransitIncidentUpdaterTest, RefreshIsAskedForAgainAndAgain) {
@@ -247,6 +337,8 @@ TEST_F(OWTransitIncidentUpdaterTest, RefreshIsAskedForAgainAndAgain) {
     turnClockTo(1800 + 181);
     EXPECT_EQ(observer->refreshes, 1);
     EXPECT_EQ(log.formats().back(), "Incident updater auto-refresh timer fired.");
+    EXPECT_EQ(log.records().back().level, LogLevel::Debug);
+    expectOnlyLinesOfTheWidget();
     turnClockTo(3600 + 181);
     EXPECT_EQ(observer->refreshes, 2);
     EXPECT_TRUE(made->_autoRefreshTimer()->isValid());
@@ -260,6 +352,17 @@ TEST_F(OWTransitIncidentUpdaterTest, AfterInvalidateNothingFires) {
     EXPECT_EQ(observer->refreshes, 0);
     EXPECT_FALSE(made->_autoRefreshTimer()->isValid());
     EXPECT_FALSE(made->_nextUpdateTimer()->isValid());
+}
+
+TEST_F(OWTransitIncidentUpdaterTest, InvalidatedInsideACallItNeverFiresAgain) {
+    const auto made = updaterOf({incident(10, 20)});
+    observer->whenExpired = [](OWTransitIncidentUpdater& updater) {
+        updater.invalidate();
+    };
+    turnClockTo(10.5);
+    EXPECT_EQ(RunLoop::main().scheduledTimers(), 0U);
+    turnClockTo(4000);
+    EXPECT_THAT(observer->calls, ElementsAre("expired"));
 }
 
 TEST_F(OWTransitIncidentUpdaterTest, ItsTimersKeepItAliveUntilItIsInvalidated) {
