@@ -1,5 +1,7 @@
 #include "Classes.h"
 #include "platform/extension/NSExtensionMain.h"
+#include "platform/extension/window/DesktopApplication.h"
+#include "platform/extension/window/DesktopWidget.h"
 #include "print/WidgetProgram.h"
 
 #include <iostream>
@@ -7,10 +9,21 @@
 
 namespace {
 
-/// The host of this program: a picture, a print or a tap as the command line says.
+/// By which desktops know the program's window.
+constexpr const char* DesktopFile = "com.zentu.Orvo.TransitWidget";
+
+std::optional<orvo::WidgetWindowing> windowing() {
+    if (!orvo::haveDisplay())
+        return std::nullopt;
+    return orvo::WidgetWindowing{
+        .makeApplication = [] { orvo::makeDesktopApplication(DesktopFile); },
+        .run = orvo::runDesktopWidget};
+}
+
+/// The host of this program: a window, a picture, a print or a tap, as the command line says.
 int runWidget(const orvo::Extension& extension, const std::vector<std::string>& arguments) {
     const auto terminal = orvo::Terminal::standard(orvo::WidgetOptions::ProgramName);
-    orvo::WidgetProgram program(extension, terminal);
+    orvo::WidgetProgram program(extension, terminal, windowing());
     const auto code = program.run(arguments);
     std::cout.flush();
     if (std::cout)

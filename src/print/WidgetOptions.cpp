@@ -1,5 +1,6 @@
 #include "print/WidgetOptions.h"
 
+#include "orvo/console/Completion.h"
 #include "orvo/console/LanguageTag.h"
 #include "platform/foundation/ISO8601.h"
 
@@ -15,8 +16,10 @@ namespace {
 
 constexpr double MinimumWidth = 160;
 constexpr double MaximumWidth = 2000;
-/// Options that say how a picture looks.
-constexpr std::array Looks{"width", "scale", "text-size", "dark", "contrast"};
+/// What is done once, of which there can be one. Without any of them the widget opens a window.
+constexpr std::array Tasks{"open", "snapshot", "dump", "print"};
+/// Options that say how a picture looks; a window looks as the desktop does.
+constexpr std::array Looks{"scale", "text-size", "dark", "contrast"};
 
 std::vector<std::string> textSizes() {
     std::vector<std::string> names;
@@ -30,9 +33,10 @@ CommandSpec spec() {
         .path = {},
         .summary = "Shows whether your favourite transit lines run normally",
         .description =
-            "Prints the widget's rows: the one of its compact mode, and those of its expanded "
-            "mode, with the numbers that --open takes. On your own profile printing writes "
-            "nothing.",
+            "Opens the widget in a window: a card that follows the looks of your desktop, and goes "
+            "when you close it (Escape, Ctrl-W). Without a display, or with --print, it prints its "
+            "rows: the one of its compact mode, and those of its expanded mode, with the numbers "
+            "that --open takes. On your own profile printing writes nothing.",
         .options =
             {{.name = "print",
               .value = "FORM",
@@ -42,7 +46,13 @@ CommandSpec spec() {
              {"payloads", "", "with --print json: what is handed over, data in base64"},
              {"follow", "", "go on until Ctrl-C, and print again when something has changed"},
              {"open", "ROW", "tap that row, from 0: the map application opens what it is about"},
-             {"snapshot", "FILE", "draw the widget's card, all its rows, into a PNG file"},
+             {.name = "snapshot",
+              .value = "FILE",
+              .help = "draw the widget's card, all its rows, into a PNG file",
+              .completes = Completes::File},
+             {"pictures",
+              "FOLDER",
+              "when printing: draw the widget in both modes besides, into files in that folder"},
              {.name = "dump",
               .value = "WHAT",
               .help = "what the picture is made of: views, constraints, or the archive that is "
@@ -52,12 +62,13 @@ CommandSpec spec() {
              {.name = "mode",
               .value = "MODE",
               .help = "of the tapped row, the picture or the dump: compact or expanded; if you say "
-                      "nothing, expanded where there is more to show",
+                      "nothing, expanded where there is more to show; of the window at its start, "
+                      "the one you chose last if you say nothing",
               .completes = Completes::Word,
               .words = {"compact", "expanded"}},
              {"width",
               "POINTS",
-              fmt::format("of the picture, {} to {}, {} if you say nothing",
+              fmt::format("of the window or the picture, {} to {}, {} if you say nothing",
                           MinimumWidth,
                           MaximumWidth,
                           WidgetHostSettings::StandardWidth)},
@@ -75,15 +86,25 @@ CommandSpec spec() {
              {"contrast", "", "with more contrast"},
              {"max-rows",
               "N",
-              "expanded rows at most, 0 for all; if you say nothing, five; what is too many "
-              "becomes "
-              "one row"},
+              "expanded rows at most, 0 for all; if you say nothing, five, and in a window what "
+              "the "
+              "screen has room for; what is too many becomes one row"},
+             {.name = "completion",
+              .value = "SHELL",
+              .help = "print a shell's completion script: bash, zsh or fish",
+              .completes = Completes::Word,
+              .words = Completion::shells()},
              {"version", "", "show the version"}},
-        .examples = {{"orvo-transit-widget --demo", "the demonstration city"},
+        .examples = {{"orvo-transit-widget --demo", "the demonstration city in a window"},
+                     {"orvo-transit-widget --demo --print text", "its rows as text"},
                      {"orvo-transit-widget --print json --max-rows 0", "every row, for a script"},
                      {"orvo-transit-widget --print waybar --follow", "for a bar that reads lines"},
                      {"orvo-transit-widget --open 0", "what the first row is about"},
                      {"orvo-transit-widget --snapshot card.png --scale 2 --dark", "a picture"}}};
+}
+
+ProgramSpec programSpec() {
+    return {WidgetOptions::ProgramName, "", {spec()}};
 }
 
 std::optional<std::uint64_t> number(const std::string& text) {
@@ -148,26 +169,40 @@ std::optional<UsageError> readLooks(const Arguments& arguments, WidgetOptions& o
     return std::nullopt;
 }
 
+bool hasTask(const Arguments& arguments) {
+    return std::ranges::any_of(Tasks, [&](const char* task) { return arguments.has(task); }) ||
+           arguments.has("follow");
+}
+
 /// What makes no sense together.
-std::optional<UsageError> findContradiction(const Arguments& arguments) {
-    constexpr std::array tasks{"open", "snapshot", "dump", "print"};
-    for (std::size_t one = 0; one < tasks.size(); ++one)
-        for (std::size_t other = one + 1; other < tasks.size(); ++other)
-            if (arguments.has(tasks[one]) && arguments.has(tasks[other]))
+std::optional<UsageError> findContradiction(const Arguments& arguments, bool showsWindow) {
+    for (std::size_t one = 0; one < Tasks.size(); ++one)
+        for (std::size_t other = one + 1; other < Tasks.size(); ++other)
+            if (arguments.has(Tasks[one]) && arguments.has(Tasks[other]))
                 return UsageError{
-                    fmt::format("--{} does not go with --{}", tasks[one], tasks[other]),
+                    fmt::format("--{} does not go with --{}", Tasks[one], Tasks[other]),
                     "Leave one of them out."};
     for (const char* task : {"open", "snapshot", "dump"})
         if (arguments.has(task) && arguments.has("follow"))
             return UsageError{fmt::format("--{} does not go with --follow", task),
                               "Leave one of them out."};
-    const bool draws = arguments.has("snapshot") || arguments.has("dump");
-    if (arguments.has("mode") && !arguments.has("open") && !draws)
-        return UsageError{"--mode belongs to --open, --snapshot or --dump",
+    for (const char* task : {"open", "snapshot", "dump", "follow"})
+        if (arguments.has(task) && arguments.has("pictures"))
+            return UsageError{fmt::format("--pictures does not go with --{}", task),
+                              "Leave one of them out."};
+    const bool draws =
+        arguments.has("snapshot") || arguments.has("dump") || arguments.has("pictures");
+    const bool isAlone =
+        arguments.has("open") || arguments.has("snapshot") || arguments.has("dump");
+    if (arguments.has("mode") && !isAlone && !showsWindow)
+        return UsageError{"--mode belongs to --open, --snapshot, --dump or a window",
                           "Both modes are printed."};
+    if (arguments.has("width") && !draws && !showsWindow)
+        return UsageError{"--width belongs to --snapshot, --pictures, --dump or a window", ""};
     for (const char* look : Looks)
         if (arguments.has(look) && !draws)
-            return UsageError{fmt::format("--{} belongs to --snapshot or --dump", look), ""};
+            return UsageError{fmt::format("--{} belongs to --snapshot, --pictures or --dump", look),
+                              showsWindow ? "A window looks as the desktop does." : ""};
     if (arguments.has("payloads") && arguments.value("print") != "json")
         return UsageError{"--payloads belongs to --print json", ""};
     return std::nullopt;
@@ -189,8 +224,8 @@ WidgetOptions::Form formNamed(const std::string& name) {
 
 } // namespace
 
-std::variant<WidgetOptions, UsageError>
-WidgetOptions::parse(const std::vector<std::string>& words) {
+std::variant<WidgetOptions, UsageError> WidgetOptions::parse(const std::vector<std::string>& words,
+                                                             Display display) {
     const auto command = spec();
     const auto parsed = ArgumentParser(command, ProgramName).parse(words);
     if (const auto* error = std::get_if<UsageError>(&parsed))
@@ -199,9 +234,11 @@ WidgetOptions::parse(const std::vector<std::string>& words) {
     WidgetOptions options;
     options.wantsHelp = arguments.has("help");
     options.wantsVersion = arguments.has("version");
-    if (options.wantsHelp || options.wantsVersion)
+    options.completion = arguments.value("completion");
+    if (options.wantsHelp || options.wantsVersion || options.completion)
         return options;
-    if (const auto error = findContradiction(arguments))
+    options.showsWindow = display == Display::Present && !hasTask(arguments);
+    if (const auto error = findContradiction(arguments, options.showsWindow))
         return *error;
     if (const auto error = readEnvironment(arguments, options))
         return *error;
@@ -215,6 +252,7 @@ WidgetOptions::parse(const std::vector<std::string>& words) {
         return *error;
     options.form = formNamed(arguments.value("print").value_or("text"));
     options.snapshot = arguments.value("snapshot");
+    options.pictures = arguments.value("pictures");
     options.dump = dumpNamed(arguments.value("dump"));
     options.withPayloads = arguments.has("payloads");
     options.follows = arguments.has("follow");
@@ -225,9 +263,13 @@ WidgetOptions::parse(const std::vector<std::string>& words) {
 }
 
 std::string WidgetOptions::help(std::size_t width) {
-    const ProgramSpec program{ProgramName, "", {spec()}};
+    const auto program = programSpec();
     return HelpText::command(program, program.commands.front(), width) +
            "\nExit status: 0 answered, 1 could not, 2 wrong usage.\n";
+}
+
+std::string WidgetOptions::completionScript(const std::string& shell) {
+    return Completion::script(programSpec(), shell);
 }
 
 } // namespace orvo

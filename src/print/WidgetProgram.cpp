@@ -1,7 +1,9 @@
 #include "print/WidgetProgram.h"
 
 #include "platform/extension/HeadlessApplication.h"
+#include "platform/extension/WidgetHost.h"
 #include "platform/feeds/ScheduleUpdater.h"
+#include "platform/foundation/DispatchQueue.h"
 #include "platform/foundation/NSDate.h"
 #include "platform/foundation/RunLoop.h"
 #include "print/JsonPrinter.h"
@@ -14,6 +16,8 @@
 #include "print/WidgetScene.h"
 #include "print/WidgetSnapshot.h"
 
+#include <algorithm>
+#include <filesystem>
 #include <fmt/format.h>
 #include <ostream>
 
@@ -23,17 +27,21 @@ namespace {
 
 /// How old what is followed may become before it is asked for again, in seconds.
 constexpr NSTimeInterval FollowRefreshInterval = 60;
+/// A demonstration that cannot be renewed is not tried again sooner, in seconds.
+constexpr NSTimeInterval LeastDemonstration = 60;
 
 } // namespace
 
-// A program that ends with its answer looks for no newer schedules beside it; `orvo` does that.
-WidgetProgram::WidgetProgram(Extension extension, Terminal terminal)
+WidgetProgram::WidgetProgram(Extension extension,
+                             Terminal terminal,
+                             std::optional<WidgetWindowing> windowing)
     : _extension(std::move(extension))
     , _terminal(std::move(terminal))
-    , _checksSchedules(ScheduleUpdater::checksDaily().overrideWith(false)) {}
+    , _windowing(std::move(windowing)) {}
 
 ExitCode WidgetProgram::run(const std::vector<std::string>& words) {
-    const auto parsed = WidgetOptions::parse(words);
+    const auto parsed = WidgetOptions::parse(
+        words, _windowing ? WidgetOptions::Display::Present : WidgetOptions::Display::None);
     if (const auto* error = std::get_if<UsageError>(&parsed)) {
         _terminal.error(error->message, error->cure);
         return ExitCode::WrongUsage;
@@ -45,6 +53,14 @@ ExitCode WidgetProgram::run(const std::vector<std::string>& words) {
     }
     if (options.wantsVersion) {
         _terminal.output() << WidgetOptions::ProgramName << ' ' << ORVO_VERSION << '\n';
+        return ExitCode::Answered;
+    }
+    if (options.showsWindow)
+        return showWindow(options);
+    // A program that ends with its answer looks for no newer schedules beside it; `orvo` does that.
+    _checksSchedules.emplace(ScheduleUpdater::checksDaily().overrideWith(false));
+    if (options.completion) {
+        _terminal.output() << WidgetOptions::completionScript(*options.completion);
         return ExitCode::Answered;
     }
     if (options.follows)
@@ -60,17 +76,18 @@ ExitCode WidgetProgram::run(const std::vector<std::string>& words) {
 bool WidgetProgram::applyEnvironment(const WidgetOptions& options) {
     if (options.language)
         _language.emplace(Text::locale().overrideWith(*options.language));
-    auto traits = options.traits;
+    auto traits = options.showsWindow ? UITraitCollection() : options.traits;
     if (Text::isRightToLeft(Text::locale().get()))
         traits.layoutDirection = UIUserInterfaceLayoutDirection::RightToLeft;
     _traits.emplace(UITraitCollection::system().overrideWith(traits));
     if (options.at) {
         const auto time = *options.at - NSTimeIntervalSince1970;
-        _clock.emplace(Environment::wallClock().overrideWith(
-            options.follows ? WallClock::startingAt(time) : WallClock::standingAt(time)));
+        _clock.emplace(Environment::wallClock().overrideWith(options.follows || options.showsWindow
+                                                                 ? WallClock::startingAt(time)
+                                                                 : WallClock::standingAt(time)));
     }
     // Looking at one's own lines, or at another time, leaves no trace.
-    if (options.at || (!options.usesDemonstration && !options.open))
+    if (options.at || (!options.usesDemonstration && !options.open && !options.showsWindow))
         _keepsWritesInMemory.emplace(Environment::keepsWritesInMemory().overrideWith(true));
     if (options.usesDemonstration) {
         std::shared_ptr<NSError> error;
@@ -89,6 +106,28 @@ void WidgetProgram::renewDemonstration() {
     if (!message.empty() && message != _saidOfDemonstration)
         _terminal.error(message);
     _saidOfDemonstration = std::move(message);
+}
+
+void WidgetProgram::keepDemonstration(const std::shared_ptr<WidgetHost>& host) {
+    if (!_demonstration)
+        return;
+    _endOfDemonstration = NSTimer::scheduledTimerWithTimeInterval_repeats_block(
+        std::max(_demonstration->secondsLeft(), LeastDemonstration),
+        false,
+        [this, weak = std::weak_ptr<WidgetHost>(host)](const auto&) {
+            const auto shown = weak.lock();
+            if (!shown)
+                return;
+            renewDemonstration();
+            // The answer may be to a question from before; the one after it is not.
+            shown->requestUpdate([weak](NCUpdateResult) {
+                DispatchQueue::mainQueue()->async([weak] {
+                    if (const auto answered = weak.lock())
+                        answered->requestUpdate();
+                });
+            });
+            keepDemonstration(shown);
+        });
 }
 
 std::unique_ptr<WidgetPrinter> WidgetProgram::printer(const WidgetOptions& options) const {
@@ -126,9 +165,47 @@ std::unique_ptr<WidgetScene> WidgetProgram::updatedScene(const WidgetOptions& op
     return scene;
 }
 
+ExitCode WidgetProgram::showWindow(const WidgetOptions& options) {
+    const TerminationSignals signals([] { RunLoop::main().stop(); });
+    _windowing->makeApplication();
+    if (!applyEnvironment(options))
+        return ExitCode::Failed;
+    const auto code = _windowing->run(
+        _extension,
+        WidgetHostSettings{
+            .width = options.width, .maxRows = options.maxRows, .mode = options.mode},
+        [this](const std::shared_ptr<WidgetHost>& host) { keepDemonstration(host); });
+    if (_endOfDemonstration)
+        _endOfDemonstration->invalidate();
+    return static_cast<ExitCode>(code);
+}
+
 ExitCode WidgetProgram::print(const WidgetOptions& options) const {
-    _terminal.output() << printer(options)->text(updatedScene(options)->printed());
-    return ExitCode::Answered;
+    const auto scene = updatedScene(options);
+    _terminal.output() << printer(options)->text(scene->printed()) << std::flush;
+    return options.pictures ? drawPictures(*scene, options) : ExitCode::Answered;
+}
+
+ExitCode WidgetProgram::drawPictures(const WidgetScene& scene, const WidgetOptions& options) const {
+    const std::filesystem::path folder = *options.pictures;
+    std::error_code failed;
+    std::filesystem::create_directories(folder, failed);
+    if (failed)
+        return fail(fmt::format("{}: {}", folder.string(), failed.message()));
+    const auto draw = [&](const char* name) {
+        const auto file = folder / name;
+        const auto failure = WidgetSnapshot::write(scene, options.traits.displayScale, file);
+        if (!failure)
+            _terminal.note("Picture: " + file.string());
+        return failure;
+    };
+    const auto& host = scene.host();
+    auto failure = draw("widget-compact.png");
+    if (!failure && host->offersExpanded()) {
+        host->setDisplayMode(NCWidgetDisplayMode::Expanded);
+        failure = draw("widget-expanded.png");
+    }
+    return failure ? fail(*failure) : ExitCode::Answered;
 }
 
 ExitCode WidgetProgram::follow(const WidgetOptions& options) {

@@ -13,8 +13,9 @@ WidgetOptions parsed(const std::vector<std::string>& words) {
                                                          : WidgetOptions{};
 }
 
-std::string refused(const std::vector<std::string>& words) {
-    const auto result = WidgetOptions::parse(words);
+std::string refused(const std::vector<std::string>& words,
+                    WidgetOptions::Display display = WidgetOptions::Display::None) {
+    const auto result = WidgetOptions::parse(words, display);
     const auto* error = std::get_if<UsageError>(&result);
     return error ? error->message : "was accepted";
 }
@@ -25,6 +26,32 @@ TEST(WidgetOptions, WithoutWordsPrintsTextAndAsManyRowsAsFit) {
     EXPECT_EQ(options.maxRows, std::nullopt);
     EXPECT_FALSE(options.follows);
     EXPECT_FALSE(options.open);
+}
+
+TEST(WidgetOptions, OnADisplayAWindowIsShownUnlessSomethingElseIsAskedFor) {
+    const auto showsWindow = [](const std::vector<std::string>& words) {
+        return std::get<WidgetOptions>(WidgetOptions::parse(words, WidgetOptions::Display::Present))
+            .showsWindow;
+    };
+    EXPECT_FALSE(parsed({}).showsWindow);
+    EXPECT_FALSE(parsed({"--demo"}).showsWindow);
+    EXPECT_TRUE(showsWindow({}));
+    EXPECT_TRUE(showsWindow({"--demo", "--at", "2025-06-15T12:00:00Z", "--language", "de"}));
+    EXPECT_TRUE(showsWindow({"--mode", "expanded", "--width", "300", "--max-rows", "2"}));
+    EXPECT_TRUE(showsWindow({"--pictures", "folder", "--scale", "2"}));
+    for (const auto& words : std::vector<std::vector<std::string>>{{"--print", "text"},
+                                                                   {"--follow"},
+                                                                   {"--open", "0"},
+                                                                   {"--snapshot", "a"},
+                                                                   {"--dump", "views"}})
+        EXPECT_FALSE(showsWindow(words)) << words.front();
+}
+
+TEST(WidgetOptions, AWindowLooksAsTheDesktopDoes) {
+    EXPECT_EQ(refused({"--dark"}, WidgetOptions::Display::Present),
+              "--dark belongs to --snapshot, --pictures or --dump");
+    EXPECT_EQ(refused({"--width", "400"}),
+              "--width belongs to --snapshot, --pictures, --dump or a window");
 }
 
 TEST(WidgetOptions, ReadsEveryOption) {
@@ -64,6 +91,7 @@ TEST(WidgetOptions, ReadsHowAPictureLooks) {
                                  .displayScale = 3,
                                  .reducesMotion = true}));
     EXPECT_EQ(options.mode, NCWidgetDisplayMode::Compact);
+    EXPECT_EQ(parsed({"--pictures", "folder"}).pictures, "folder");
 }
 
 TEST(WidgetOptions, ReadsWhatToDump) {
@@ -78,9 +106,12 @@ TEST(WidgetOptions, RefusesPicturesThatCannotBe) {
     EXPECT_EQ(refused({"--snapshot", "a", "--text-size", "XX"}), "--text-size cannot be XX");
     EXPECT_EQ(refused({"--snapshot", "a", "--width", "159"}), "--width: \"159\" is no width");
     EXPECT_EQ(refused({"--snapshot", "a", "--width", "2001"}), "--width: \"2001\" is no width");
-    EXPECT_EQ(refused({"--dark"}), "--dark belongs to --snapshot or --dump");
+    EXPECT_EQ(refused({"--dark"}), "--dark belongs to --snapshot, --pictures or --dump");
     EXPECT_EQ(refused({"--print", "text", "--scale", "2"}),
-              "--scale belongs to --snapshot or --dump");
+              "--scale belongs to --snapshot, --pictures or --dump");
+    EXPECT_EQ(refused({"--pictures", "a", "--follow"}), "--pictures does not go with --follow");
+    EXPECT_EQ(refused({"--pictures", "a", "--snapshot", "b"}),
+              "--pictures does not go with --snapshot");
     EXPECT_EQ(refused({"--snapshot", "a", "--dump", "views"}),
               "--snapshot does not go with --dump");
     EXPECT_EQ(refused({"--snapshot", "a", "--follow"}), "--snapshot does not go with --follow");
@@ -101,7 +132,8 @@ TEST(WidgetOptions, RefusesWhatCannotBeRead) {
 TEST(WidgetOptions, RefusesWhatMakesNoSenseTogether) {
     EXPECT_EQ(refused({"--open", "0", "--print", "text"}), "--open does not go with --print");
     EXPECT_EQ(refused({"--open", "0", "--follow"}), "--open does not go with --follow");
-    EXPECT_EQ(refused({"--mode", "compact"}), "--mode belongs to --open, --snapshot or --dump");
+    EXPECT_EQ(refused({"--mode", "compact"}),
+              "--mode belongs to --open, --snapshot, --dump or a window");
     EXPECT_EQ(refused({"--payloads"}), "--payloads belongs to --print json");
     EXPECT_EQ(refused({"--payloads", "--print", "text"}), "--payloads belongs to --print json");
 }

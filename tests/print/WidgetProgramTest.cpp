@@ -2,6 +2,8 @@
 
 #include "platform/demo/DemoIncidents.h"
 #include "platform/demo/DemoProfile.h"
+#include "platform/extension/WidgetHost.h"
+#include "platform/feeds/ScheduleUpdater.h"
 #include "platform/foundation/DispatchQueue.h"
 #include "platform/foundation/RunLoop.h"
 #include "print/SceneWorld.h"
@@ -119,6 +121,24 @@ TEST_F(WidgetProgramTest, DrawsAllRowsOfTheModeInPixelsOfTheScale) {
     EXPECT_FALSE(std::filesystem::exists(file.string() + ".new"));
 }
 
+TEST_F(WidgetProgramTest, BesideWhatIsPrintedItDrawsBothModes) {
+    answerWith(threeLines());
+    const auto folder = profile.path() / "some" / "pictures";
+    ASSERT_EQ(run({"--pictures", folder.string()}), Exit::Answered);
+    EXPECT_EQ(output.str().rfind("compact:\n", 0), 0U);
+    EXPECT_EQ(pixelsOf(folder / "widget-compact.png"), std::pair(359U, 36U + 110U));
+    EXPECT_EQ(pixelsOf(folder / "widget-expanded.png"), std::pair(359U, 36U + 3 * 110U));
+    EXPECT_EQ(error.str(),
+              "Picture: " + (folder / "widget-compact.png").string() +
+                  "\nPicture: " + (folder / "widget-expanded.png").string() + "\n");
+    answerWith({});
+    const auto other = profile.path() / "other";
+    ASSERT_EQ(run({"--pictures", other.string()}), Exit::Answered);
+    EXPECT_FALSE(std::filesystem::exists(other / "widget-expanded.png")) << "nothing more to show";
+    answerWith({});
+    EXPECT_EQ(run({"--pictures", (other / "widget-compact.png").string()}), Exit::Failed);
+}
+
 TEST_F(WidgetProgramTest, APictureThatCannotBeWrittenIsNamed) {
     answerWith(threeLines());
     const auto file = (profile.path() / "no folder" / "card.png").string();
@@ -147,7 +167,7 @@ TEST_F(WidgetProgramTest, DumpsTheViewsOfEveryRow) {
 TEST_F(WidgetProgramTest, ARightToLeftLanguageMirrorsTheCard) {
     answerWith(threeLines());
     ASSERT_EQ(run({"--dump", "views", "--language", "ar"}), Exit::Answered);
-    EXPECT_NE(output.str().find("UIImageView1 323 8 20 20"), std::string::npos) << output.str();
+    EXPECT_NE(output.str().find("UIImageView1 327 8 20 20"), std::string::npos) << output.str();
 }
 
 TEST_F(WidgetProgramTest, DumpsTheConstraintsOfTheCardAndOfEachRow) {
@@ -164,6 +184,87 @@ TEST_F(WidgetProgramTest, DumpsWhatIsKeptBetweenStarts) {
     EXPECT_NE(output.str().find("$archiver = \"NSKeyedArchiver\""), std::string::npos);
     EXPECT_NE(output.str().find("expanded = 1"), std::string::npos);
     EXPECT_NE(output.str().find("\"TransitStorageLineItem\""), std::string::npos);
+}
+
+/// Shows the widget in a window that nobody sees, of which it notes what the program gave it.
+struct NotedWindow {
+    WidgetWindowing windowing() {
+        return {.makeApplication = [this] { ++applications; },
+                .run =
+                    [this](const Extension& extension,
+                           const WidgetHostSettings& given,
+                           const WidgetWindowing::Began& began) {
+                        settings = given;
+                        keptInMemory = Environment::keepsWritesInMemory().get();
+                        checksSchedules = ScheduleUpdater::checksDaily().get();
+                        now = NSDate::date()->timeIntervalSince1970();
+                        traits = UITraitCollection::system().get();
+                        const auto host = WidgetHost::hostWithExtension_settings(extension, given);
+                        began(host);
+                        while_(host);
+                        return 0;
+                    }};
+    }
+
+    int applications = 0;
+    WidgetHostSettings settings;
+    bool keptInMemory = false;
+    bool checksSchedules = false;
+    double now = 0;
+    UITraitCollection traits;
+    std::function<void(const std::shared_ptr<WidgetHost>&)> while_ = [](const auto&) {
+    };
+};
+
+class WindowTest : public WidgetProgramTest {
+protected:
+    Exit runInWindow(const std::vector<std::string>& words) {
+        return WidgetProgram(extension(),
+                             Terminal(output, error, {.program = WidgetOptions::ProgramName}),
+                             window.windowing())
+            .run(words);
+    }
+
+    NotedWindow window;
+};
+
+TEST_F(WindowTest, IsOpenedWithWhatTheCommandLineSays) {
+    EXPECT_EQ(runInWindow({"--width", "300", "--mode", "expanded", "--max-rows", "2"}),
+              Exit::Answered);
+    EXPECT_EQ(window.applications, 1);
+    EXPECT_EQ(window.settings.width, 300);
+    EXPECT_EQ(window.settings.mode, NCWidgetDisplayMode::Expanded);
+    EXPECT_EQ(window.settings.maxRows, 2U);
+    EXPECT_EQ(output.str() + error.str(), "");
+}
+
+TEST_F(WindowTest, LivesOnSoItMovesKeepsAndLooksForNewerSchedules) {
+    EXPECT_EQ(runInWindow({}), Exit::Answered);
+    EXPECT_EQ(window.settings.mode, std::nullopt) << "the one chosen last";
+    EXPECT_FALSE(window.traits.reducesMotion);
+    EXPECT_FALSE(window.keptInMemory);
+    EXPECT_TRUE(window.checksSchedules);
+}
+
+TEST_F(WindowTest, AtAnotherTimeItKeepsNothingAndTheClockGoesOn) {
+    window.while_ = [](const auto&) {
+        const auto begin = NSDate::date()->timeIntervalSince1970();
+        const auto later = [&] {
+            return NSDate::date()->timeIntervalSince1970() > begin;
+        };
+        EXPECT_TRUE(RunLoop::main().runUntil(later, 60));
+    };
+    EXPECT_EQ(runInWindow({"--at", "1970-01-02T00:00:00Z", "--language", "ar"}), Exit::Answered);
+    EXPECT_TRUE(window.keptInMemory);
+    EXPECT_NEAR(window.now, 86400, 60);
+    EXPECT_EQ(window.traits.layoutDirection, UIUserInterfaceLayoutDirection::RightToLeft);
+}
+
+TEST_F(WindowTest, WithATaskThereIsNone) {
+    answerWith({});
+    EXPECT_EQ(runInWindow({"--print", "text"}), Exit::Answered);
+    EXPECT_EQ(window.applications, 0);
+    EXPECT_EQ(output.str().rfind("compact:\n", 0), 0U);
 }
 
 /// The demonstration's folders follow the base directories, which belong to the process.
@@ -219,6 +320,31 @@ TEST_F(DemonstrationTest, FollowedItGoesOnWhenItsHourIsOver) {
     DispatchQueue::mainQueue()->async(look);
     EXPECT_EQ(run({"--demo", "--follow"}), Exit::Answered);
     EXPECT_EQ(city->wasCurrent, (std::vector<bool>{true, true}));
+    EXPECT_EQ(error.str(), "");
+}
+
+TEST_F(DemonstrationTest, InAWindowItGoesOnWhenItsHourIsOver) {
+    const auto city = std::make_shared<CurrentCityLookup>();
+    const auto asked = LookupService::shared().overrideWith(city);
+    NotedWindow window;
+    window.while_ = [&](const std::shared_ptr<WidgetHost>& host) {
+        host->setShown(true);
+        EXPECT_TRUE(loop.runUntil([&] { return !city->wasCurrent.empty(); }, 60));
+        loop.runOnce();
+        EXPECT_LE(loop.scheduledTimers(), 3U) << "no timer that goes off while nothing happens";
+        world.clock->advance(DemoIncidents::LifetimeSeconds + 1);
+        loop.checkTimers();
+        EXPECT_TRUE(DemoProfile::isCurrent());
+        // The half-hour's refresh may be first, of the city that was.
+        const auto before = city->wasCurrent.size();
+        EXPECT_TRUE(loop.runUntil(
+            [&] { return city->wasCurrent.size() > before && city->wasCurrent.back(); }, 60));
+        host->setShown(false);
+    };
+    EXPECT_EQ(
+        WidgetProgram(extension(), Terminal(output, error, {}), window.windowing()).run({"--demo"}),
+        Exit::Answered);
+    EXPECT_GE(city->wasCurrent.size(), 2U);
     EXPECT_EQ(error.str(), "");
 }
 

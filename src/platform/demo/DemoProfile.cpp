@@ -118,7 +118,9 @@ Error writeFavorites() {
             return error;
     }
     for (const auto& routeId : DemoCity::favoriteRouteIds()) {
-        const auto line = schedules->line(lineMuid(DemoCity::FeedName, routeId));
+        const auto line = schedules->line(lineMuid(DemoCity::FeedName, routeId), &error);
+        if (error)
+            return error;
         if (line && (error = store->addLine(*makeTransitLine(*line))))
             return error;
     }
@@ -220,6 +222,13 @@ bool isCurrent() {
     if (isLive())
         return !Environment::keepsWritesInMemory().get() && serverRuns();
     return isInTime(*written);
+}
+
+double secondsLeft() {
+    if (!isCurrent())
+        return 0;
+    return isLive() ? DemoIncidents::LifetimeSeconds
+                    : *writtenAt() + DemoIncidents::LifetimeSeconds - now();
 }
 
 } // namespace orvo::DemoProfile

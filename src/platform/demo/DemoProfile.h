@@ -35,6 +35,9 @@ private:
 /// Whether there is a city, its time has come and not run out, and its server, if it has one, runs.
 /// Writes nothing.
 [[nodiscard]] bool isCurrent();
+/// How long it stays so: at most `DemoIncidents::LifetimeSeconds`, which is also what is said of
+/// one with a server; 0 where it is not current.
+[[nodiscard]] double secondsLeft();
 
 } // namespace DemoProfile
 

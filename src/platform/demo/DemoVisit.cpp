@@ -64,6 +64,11 @@ std::shared_ptr<NSError> DemoVisit::renew() {
     return failure;
 }
 
+// NOLINTNEXTLINE(readability-convert-member-functions-to-static): it is the visit's own city
+double DemoVisit::secondsLeft() const {
+    return DemoProfile::secondsLeft();
+}
+
 DemoVisit::~DemoVisit() {
     std::error_code ignored;
     if (!_aside.empty())

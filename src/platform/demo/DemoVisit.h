@@ -32,6 +32,9 @@ public:
     /// Writes the city anew where its time has run out meanwhile, or its server has ended, as at
     /// the beginning. Nil, or why there is no current city; then the one there was stays.
     [[nodiscard]] std::shared_ptr<NSError> renew();
+    /// Until the city's time runs out: at most an hour, which is also what a city with a server
+    /// has; 0 where there is no current one.
+    [[nodiscard]] double secondsLeft() const;
 
 private:
     explicit DemoVisit(Purpose purpose);

@@ -1,6 +1,6 @@
 #include "platform/extension/HeadlessApplication.h"
 
-#include "platform/foundation/Log.h"
+#include "platform/extension/ToolkitRemarks.h"
 
 #include <QGuiApplication>
 
@@ -8,20 +8,6 @@
 #include <string>
 
 namespace orvo {
-
-namespace {
-
-/// What the toolkit has to remark on its surroundings is nothing for a person who asked for rows.
-void logRemark(QtMsgType type, const QMessageLogContext&, const QString& message) {
-    const auto log = Log::findOrCreate("Toolkit");
-    const auto text = message.toStdString();
-    if (type == QtCriticalMsg || type == QtFatalMsg)
-        log->error("%s", text);
-    else
-        log->debug("%s", text);
-}
-
-} // namespace
 
 void makeHeadlessApplication() {
     if (QCoreApplication::instance())
@@ -31,7 +17,7 @@ void makeHeadlessApplication() {
     static std::string platform = "offscreen";
     static std::array<char*, 4> words = {name.data(), option.data(), platform.data(), nullptr};
     static int count = 3;
-    qInstallMessageHandler(logRemark);
+    logToolkitRemarks();
     QGuiApplication::setDesktopSettingsAware(false);
     // Never destroyed: it would go after what it stands on.
     new QGuiApplication(count, words.data());

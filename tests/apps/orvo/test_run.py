@@ -40,14 +40,18 @@ class Run(ProgramTest):
         self.assertEqual((answer.code, answer.out), (0, "widget --demo --max-rows 3\n"), answer.err)
         self.assertIn("no favourites yet", answer.err)
 
+    def test_without_a_display_there_are_pictures(self):
+        self.assertEqual(self.run_it().out, "widget --demo --pictures build/pictures --scale 2\n")
+        self.assertEqual(self.run_it("--print", "json").out, "widget --demo --print json\n")
+
     def test_a_favourite_line_is_one_of_ones_own(self):
         self.orvo("feeds", "add", "city", "--static", self.schedule(), "--alerts", "nowhere.pb")
         self.orvo("favorites", "add", "city:r1")
-        self.assertEqual(self.run_it().out, "widget \n")
+        self.assertEqual(self.run_it().out, "widget --pictures build/pictures --scale 2\n")
 
     def test_a_favourite_place_is_one_of_ones_own(self):
         self.orvo("favorites", "add", "--place", "Home", "--location", "54.3821,10.1401")
-        self.assertEqual(self.run_it().out, "widget \n")
+        self.assertEqual(self.run_it().out, "widget --pictures build/pictures --scale 2\n")
 
     def test_unreadable_favourites_are_not_like_none(self):
         self.orvo("favorites", "add", "--place", "Home", "--location", "54.3821,10.1401")

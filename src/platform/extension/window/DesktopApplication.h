@@ -4,7 +4,8 @@
 
 namespace orvo {
 
-/// Whether the environment names a display that windows can be shown on.
+/// Whether the environment names a display that windows can be shown on. One of this machine must
+/// be served by somebody: a name that was left behind is none.
 [[nodiscard]] bool haveDisplay();
 
 /// Makes the program's application object, for windows, where there is none yet: quick to start,

@@ -57,8 +57,12 @@ void DesktopWidget::takeAppearance(const DesktopAppearance& appearance) {
     appearance.remember();
 }
 
-int runDesktopWidget(const Extension& extension, const WidgetHostSettings& settings) {
+int runDesktopWidget(const Extension& extension,
+                     const WidgetHostSettings& settings,
+                     const std::function<void(const std::shared_ptr<WidgetHost>& host)>& began) {
     const DesktopWidget widget(extension, settings, [] { RunLoop::main().stop(); });
+    if (began)
+        began(widget.host());
     return RunLoop::main().run();
 }
 

@@ -41,7 +41,10 @@ private:
 };
 
 /// Shows an extension in a window until the person closes it, or somebody stops the main run loop.
-/// Answers the exit code.
-int runDesktopWidget(const Extension& extension, const WidgetHostSettings& settings);
+/// `began`, which may be empty, is told of the host once the window is open. Answers the exit code.
+int runDesktopWidget(
+    const Extension& extension,
+    const WidgetHostSettings& settings,
+    const std::function<void(const std::shared_ptr<WidgetHost>& host)>& began = {});
 
 } // namespace orvo

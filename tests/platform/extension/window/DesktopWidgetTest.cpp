@@ -101,17 +101,5 @@ TEST_F(DesktopWidgetTest, AsksNobodyBeforeTheFirstFrame) {
     EXPECT_EQ(world.widget->appearances, 0);
 }
 
-TEST(DesktopApplication, KnowsADisplayByItsVariables) {
-    unsetenv("QT_QPA_PLATFORM");
-    unsetenv("DISPLAY");
-    setenv("WAYLAND_DISPLAY", "", 1);
-    EXPECT_FALSE(haveDisplay());
-    setenv("WAYLAND_DISPLAY", "wayland-0", 1);
-    EXPECT_TRUE(haveDisplay());
-    unsetenv("WAYLAND_DISPLAY");
-    setenv("DISPLAY", ":0", 1);
-    EXPECT_TRUE(haveDisplay());
-}
-
 } // namespace
 } // namespace orvo
