@@ -4,8 +4,10 @@ import bz2
 import os
 import pathlib
 import plistlib
+import re
 import shutil
 import subprocess
+import tempfile
 
 from support import ProgramTest, field
 
@@ -84,10 +86,14 @@ class BusTest(ProgramTest):
         (folder / f"{NAME}.service").write_text(f"[D-BUS Service]\nName={NAME}\nExec={command}\n")
 
     def bus_with(self, services):
+        # Not below the home folder: a socket's path must be short, and in an address without blanks.
+        folder = tempfile.TemporaryDirectory(prefix="orvo-bus-", dir="/tmp")
+        self.addCleanup(folder.cleanup)
         configuration = self.write("bus.conf", (
             '<!DOCTYPE busconfig PUBLIC "-//freedesktop//DTD D-Bus Bus Configuration 1.0//EN" '
             '"http://www.freedesktop.org/standards/dbus/1.0/busconfig.dtd">\n'
-            f'<busconfig><type>session</type><listen>unix:path={self.home}/bus</listen>{services}'
+            f'<busconfig><type>session</type><listen>unix:path={folder.name}/bus</listen>{services}'
+            f'<limit name="service_start_timeout">{PATIENCE * 1000}</limit>'
             '<policy context="default"><allow send_destination="*" eavesdrop="true"/><allow eavesdrop="true"/>'
             '<allow own="*"/></policy></busconfig>').encode())
         bus = subprocess.Popen(["dbus-daemon", f"--config-file={configuration}", "--nofork", "--print-address"],
@@ -108,15 +114,17 @@ class BusTest(ProgramTest):
         return self.ask("org.freedesktop.DBus", "/org/freedesktop/DBus", f"org.freedesktop.DBus.{method}", *arguments)
 
     def ask(self, name, path, method, *arguments):
-        return subprocess.run(["gdbus", "call", "--session", "--dest", name, "--object-path", path, "--method", method,
-                               *arguments], env=self.environment, capture_output=True, timeout=PATIENCE, text=True)
+        return subprocess.run(["gdbus", "call", "--session", "--timeout", str(PATIENCE), "--dest", name, "--object-path",
+                               path, "--method", method, *arguments], env=self.environment, capture_output=True,
+                              timeout=2 * PATIENCE, text=True)
 
     def is_running(self):
         return "true" in self.ask_bus("NameHasOwner", NAME).stdout
 
     def owner(self):
         """The process that serves the application."""
-        return int(self.ask_bus("GetConnectionUnixProcessID", NAME).stdout.strip("(),\nuint32 "))
+        answer = self.ask_bus("GetConnectionUnixProcessID", NAME)
+        return int(re.fullmatch(r"\(uint32 (\d+),\)\n", answer.stdout)[1])
 
     def wait_for_owner(self, process):
         """Until the process serves the application."""
