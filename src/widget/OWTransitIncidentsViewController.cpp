@@ -146,7 +146,8 @@ void OWTransitIncidentsViewController::viewDidDisappear(bool animated) {
 void OWTransitIncidentsViewController::viewWillTransitionToSize_withTransitionCoordinator(
     CGSize size, const std::shared_ptr<UIViewControllerTransitionCoordinator>& coordinator) {
     // Without the base class's share. Kept so.
-    _dataSource->setAvailableWidth(size.width);
+    if (_dataSource)
+        _dataSource->setAvailableWidth(size.width);
     const std::weak_ptr<OWTransitIncidentsViewController> weak = strong(this);
     coordinator->animateAlongsideTransition_completion(
         [weak] {
@@ -179,8 +180,9 @@ void OWTransitIncidentsViewController::widgetActiveDisplayModeDidChange_withMaxi
     NCWidgetDisplayMode mode, CGSize /*maximumSize*/) {
     _analyticsDelegate->recordWidgetChangeDisplayMode(mode);
     const auto& context = extensionContext();
-    _dataSource->setExpanded(context &&
-                             context->widgetActiveDisplayMode() == NCWidgetDisplayMode::Expanded);
+    if (_dataSource) // a host may say so before it has loaded the view
+        _dataSource->setExpanded(context && context->widgetActiveDisplayMode() ==
+                                                NCWidgetDisplayMode::Expanded);
 }
 
 // Fetching

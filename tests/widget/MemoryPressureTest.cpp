@@ -1,4 +1,5 @@
 #include "platform/foundation/Signpost.h"
+#include "support/GraphicalApplication.h"
 #include "widget/WidgetWorld.h"
 
 #include <gmock/gmock.h>
@@ -27,8 +28,21 @@ private:
     Calls& _calls;
 };
 
-class MemoryPressureOfTheWidget : public testing::WidgetWorld {
+/// Before the run loop makes an application object without a screen.
+struct ForDrawing {
+    bool canDraw = testing::haveGraphicalApplication();
+};
+
+class MemoryPressureOfTheWidget : protected ForDrawing, public testing::WidgetWorld {
 protected:
+    static void drawInto(ArtworkDataSourceCache& cache) {
+        constexpr bool night = false;
+        const auto artwork = TransitArtworkDataSource::initWithFields(
+            {.artworkSourceType = 1,
+             .shieldDataSource =
+                 TransitShieldDataSource::initWithFields({.shieldType = 1, .shieldText = "M1"})});
+        EXPECT_TRUE(cache.imageForArtwork_shieldSize_scale_nightMode(artwork, 3, 1, night));
+    }
     std::vector<std::shared_ptr<FakeSource>> sources;
     std::vector<std::shared_ptr<DispatchQueue>> queues;
 
@@ -36,6 +50,8 @@ private:
     EnvironmentSlot<DispatchSource::Factory>::Override _factory =
         DispatchSource::memoryPressureFactory().overrideWith(
             [this](MemoryPressure mask, std::shared_ptr<DispatchQueue> queue) {
+                EXPECT_TRUE(controller->isViewLoaded());
+                EXPECT_EQ(controller->tableView(), nullptr) << "is made after the sources";
                 queues.push_back(std::move(queue));
                 sources.push_back(std::make_shared<FakeSource>(
                     std::to_string(static_cast<unsigned>(mask)), calls));
@@ -70,7 +86,6 @@ TEST_F(MemoryPressureOfTheWidget, LeavesAMarkAndFreesNothing) {
     controller = makeController();
     (void)controller->view();
     const auto cache = controller->artworkCache();
-    const auto bytes = cache->bytes();
     for (const auto& source : sources)
         source->handler();
     ASSERT_EQ(events.size(), 4U);
@@ -83,7 +98,23 @@ TEST_F(MemoryPressureOfTheWidget, LeavesAMarkAndFreesNothing) {
         EXPECT_EQ(event.category, "TransitWidget");
         EXPECT_EQ(event.subsystem, "com.zentu.Orvo.suggestions");
     }
+    EXPECT_EQ(controller->artworkCache(), cache);
+}
+
+TEST_F(MemoryPressureOfTheWidget, KeepsThePicturesWhichAWarningLetsGo) {
+    if (!canDraw)
+        GTEST_SKIP() << "another test of this process has made an application without a screen";
+    controller = makeController();
+    (void)controller->view();
+    const auto cache = controller->artworkCache();
+    drawInto(*cache);
+    const auto bytes = cache->bytes();
+    ASSERT_GT(bytes, 0U);
+    for (const auto& source : sources)
+        source->handler();
     EXPECT_EQ(cache->bytes(), bytes);
+    controller->didReceiveMemoryWarning();
+    EXPECT_EQ(cache->bytes(), 0U);
     EXPECT_EQ(controller->artworkCache(), cache);
 }
 

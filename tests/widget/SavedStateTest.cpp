@@ -1,6 +1,9 @@
 #include "platform/foundation/NSData.h"
+#include "platform/foundation/NSDictionary.h"
 #include "platform/foundation/NSKeyedArchiver.h"
+#include "platform/foundation/NSString.h"
 #include "shared/NSUserDefaults_OrvoGroup.h"
+#include "viewmodel/OWTransitItemDataSourceBuilder.h"
 #include "widget/WidgetWorld.h"
 
 #include <gmock/gmock.h>
@@ -8,6 +11,8 @@
 namespace orvo {
 namespace {
 
+using ::testing::ElementsAre;
+using ::testing::HasSubstr;
 using testing::makeItem;
 
 constexpr const char* Key = "Orvo.TransitWidget.savedUIData";
@@ -19,6 +24,20 @@ std::shared_ptr<NSObject> stored() {
 void store(const std::shared_ptr<NSObject>& object) {
     ASSERT_EQ(OrvoGroup::__orvo_groupUserDefaults()->setObject_forKey(object, Key), nullptr);
 }
+
+/// Nothing that an archive can hold.
+class Unarchivable final : public virtual NSObject {};
+
+/// A record whose archive has the flag and nothing else.
+class FlagAlone final : public virtual NSSecureCoding {
+public:
+    void encodeWithCoder(NSCoder& coder) const override {
+        coder.encodeBool_forKey(true, "expanded");
+    }
+    std::vector<std::string> classesForCoder() const override {
+        return {"OWTransitIncidentViewControllerState", "NSObject"};
+    }
+};
 
 /// What the widget keeps from one life to the next.
 class SavedState : public testing::WidgetWorld {
@@ -42,6 +61,13 @@ protected:
                 last = record;
         return last;
     }
+    std::ptrdiff_t linesOf(const char* format) const {
+        return std::ranges::count(log.formats(), format);
+    }
+    /// The rows that the builder makes of a result.
+    static std::shared_ptr<OWTransitListItem> rowsOf(const std::shared_ptr<Result>& result) {
+        return OWTransitDataSourceBuilderForResult(result, 0, nullptr, nullptr)->listItem();
+    }
     void expectLastLine(const char* format) const {
         EXPECT_EQ(lastWidgetRecord().format, format);
         EXPECT_EQ(lastWidgetRecord().level, LogLevel::Debug);
@@ -51,8 +77,10 @@ protected:
 TEST_F(SavedState, WithoutAnyTheWidgetStartsWithoutFavoriteLines) {
     load();
     expectLastLine("No view model found in NSUserDefaults (key: %{private}@)");
-    EXPECT_NE(lastWidgetRecord().message.find(Key), std::string::npos);
+    EXPECT_EQ(lastWidgetRecord().message,
+              std::string("No view model found in NSUserDefaults (key: ") + Key + ")");
     EXPECT_TRUE(controller->dataSource()->transitLineItemResult()->isSuccess());
+    EXPECT_TRUE(equal(controller->dataSource()->listItem(), rowsOf(success())));
     EXPECT_EQ(controller->transitLineItemResult(), nullptr);
     EXPECT_FALSE(controller->dataSource()->isExpanded());
 }
@@ -65,6 +93,101 @@ TEST_F(SavedState, IsShownBeforeAnyFetchHasEnded) {
     EXPECT_EQ(controller->transitLineItemResult(), nullptr);
     EXPECT_EQ(controller->request(), nullptr);
     EXPECT_EQ(controller->updater(), nullptr);
+    EXPECT_TRUE(equal(controller->dataSource()->listItem(), rowsOf(failure())));
+    EXPECT_FALSE(equal(controller->dataSource()->listItem(), rowsOf(success())));
+}
+
+TEST_F(SavedState, OfASuccessIsShownAsRowsInItsMode) {
+    keep(success({disturbedLine(1, "Works"), disturbedLine(2, "Delays")}), true);
+    load();
+    EXPECT_TRUE(controller->dataSource()->isExpanded());
+    EXPECT_THAT(titles(*controller->dataSource()), ElementsAre("Works", "Delays"));
+    EXPECT_EQ(controller->tableView()->numberOfRowsInSection(0), 2);
+    EXPECT_EQ(controller->transitLineItemResult(), nullptr);
+    controller->viewWillAppear(false);
+    EXPECT_TRUE(controller->request()) << "the fetch has not ended";
+    EXPECT_EQ(context->largest, NCWidgetDisplayMode::Expanded);
+    EXPECT_THAT(titles(*controller->dataSource()), ElementsAre("Works", "Delays"));
+    runUntilFetched();
+    EXPECT_EQ(context->largest, NCWidgetDisplayMode::Compact);
+}
+
+TEST_F(SavedState, IsShownWithinTheHostsNumberOfRows) {
+    keep(success({disturbedLine(1, "A"), disturbedLine(2, "B"), disturbedLine(3, "C")}), true);
+    context->expandedMaximum.height = 300;
+    load();
+    EXPECT_EQ(controller->tableView()->numberOfRowsInSection(0), 2);
+    context->expandedMaximum.height = 616;
+    load();
+    EXPECT_EQ(controller->tableView()->numberOfRowsInSection(0), 3);
+}
+
+TEST_F(SavedState, OfAnyAgeIsShown) {
+    keep(success({disturbedLine(1, "Works"), disturbedLine(2, "Delays")}), true);
+    constexpr double Decade = 10 * 365 * 86400.0;
+    clock->advance(Decade);
+    load();
+    EXPECT_THAT(titles(*controller->dataSource()), ElementsAre("Works", "Delays"));
+    EXPECT_TRUE(stored());
+}
+
+TEST_F(SavedState, IsReadOnceAndWrittenOnceInALife) {
+    keep(success({makeItem(1)}));
+    load();
+    controller->viewWillAppear(false);
+    controller->viewDidAppear(false);
+    runUntilFetched();
+    EXPECT_EQ(linesOf("Saving view model to NSUserDefault (key: %{private}@) : %{private}@"), 0);
+    controller->viewWillDisappear(false);
+    controller->viewDidDisappear(false);
+    EXPECT_EQ(linesOf("View model loaded from NSUserDefaults (key: %{private}@): %{private}@"), 1);
+    EXPECT_EQ(linesOf("Saving view model to NSUserDefault (key: %{private}@) : %{private}@"), 1);
+}
+
+TEST_F(SavedState, OfALifeThatEndsBeforeItsFetchIsKeptAgain) {
+    saveFavorites({1}); // its lookup is not answered
+    keep(success({disturbedLine(1, "Works"), disturbedLine(2, "Delays")}), true);
+    for (int life = 0; life < 2; ++life) {
+        load();
+        controller->viewWillAppear(false);
+        controller->viewWillDisappear(false);
+        ASSERT_EQ(controller->transitLineItemResult(), nullptr);
+    }
+    load();
+    EXPECT_TRUE(controller->dataSource()->isExpanded());
+    EXPECT_THAT(titles(*controller->dataSource()), ElementsAre("Works", "Delays"));
+}
+
+TEST_F(SavedState, TheLinesNameKeyAndRecord) {
+    load();
+    controller->_saveUIData();
+    const std::string keyed = std::string("(key: ") + Key + ")";
+    EXPECT_THAT(lastWidgetRecord().message,
+                HasSubstr("Saving view model to NSUserDefault " + keyed + " : <"));
+    EXPECT_THAT(lastWidgetRecord().message, HasSubstr("expanded: NO"));
+    load();
+    EXPECT_THAT(lastWidgetRecord().message,
+                HasSubstr("View model loaded from NSUserDefaults " + keyed + ": <"));
+    EXPECT_THAT(lastWidgetRecord().message, HasSubstr("expanded: NO"));
+}
+
+TEST_F(SavedState, WithoutAResultIsLoggedAsLoadedAndStays) {
+    store(NSKeyedArchiver::archivedDataWithRootObject_requiringSecureCoding_error(
+        std::make_shared<FlagAlone>(), true));
+    load();
+    EXPECT_EQ(lastWidgetRecord().message,
+              std::string("View model loaded from NSUserDefaults (key: ") + Key + "): (null)");
+    EXPECT_TRUE(stored());
+    EXPECT_FALSE(controller->dataSource()->isExpanded());
+    EXPECT_TRUE(equal(controller->dataSource()->listItem(), rowsOf(success())));
+}
+
+TEST_F(SavedState, OfAnotherKindThanDataIsLoggedAsLoadedAndStays) {
+    store(NSString::string("a text"));
+    load();
+    EXPECT_EQ(lastWidgetRecord().message,
+              std::string("View model loaded from NSUserDefaults (key: ") + Key + "): (null)");
+    EXPECT_TRUE(stored());
 }
 
 TEST_F(SavedState, NoUpdaterWatchesIt) {
@@ -107,6 +230,9 @@ TEST_F(SavedState, CorruptDataIsRemovedAndNothingIsShownOfIt) {
     load();
     expectLastLine("Error parsing ViewModel data loaded from NSUserDefaults, removing it (key: "
                    "%{private}@): %{private}@ - error: %{private}@");
+    EXPECT_THAT(lastWidgetRecord().message,
+                HasSubstr(std::string("(key: ") + Key + "): (null) - "));
+    EXPECT_THAT(lastWidgetRecord().message, HasSubstr("- error: Error Domain=NSCocoaErrorDomain"));
     EXPECT_EQ(stored(), nullptr);
     EXPECT_TRUE(controller->dataSource()->transitLineItemResult()->isSuccess());
 }
@@ -131,6 +257,22 @@ TEST_F(SavedState, WhatCannotBeArchivedLeavesTheFormerOne) {
     controller->_saveUIData();
     expectLastLine("Unable to cache view model to disk because it couldnt be converted to NSData: "
                    "%{private}@");
+    EXPECT_TRUE(equal(stored(), former));
+}
+
+TEST_F(SavedState, AnErrorThatNoArchiveCanHoldLeavesTheFormerOne) {
+    keep(success({makeItem(1)}));
+    const auto former = stored();
+    load();
+    controller->setTransitLineItemResult(
+        Result::resultWithError(NSError::errorWithDomain_code_userInfo(
+            "LookupDomain",
+            5,
+            NSDictionary::dictionaryWithTextKeys({{"of", std::make_shared<Unarchivable>()}}))));
+    controller->viewWillDisappear(false);
+    expectLastLine("Unable to cache view model to disk because it couldnt be converted to NSData: "
+                   "%{private}@");
+    EXPECT_THAT(lastWidgetRecord().message, HasSubstr("expanded: NO"));
     EXPECT_TRUE(equal(stored(), former));
 }
 

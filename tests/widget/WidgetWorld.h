@@ -5,6 +5,7 @@
 #include "platform/favorites/TransitStorageLineItem.h"
 #include "platform/foundation/CodingClass.h"
 #include "platform/foundation/RunLoop.h"
+#include "platform/geoservices/TransitIncidentRecord.h"
 #include "platform/uikit/UIViewControllerTransitionCoordinator.h"
 #include "support/LogCapture.h"
 #include "support/TemporaryProfile.h"
@@ -35,6 +36,7 @@ public:
     NCWidgetDisplayMode widgetActiveDisplayMode() const override { return mode; }
     NCWidgetDisplayMode widgetLargestAvailableDisplayMode() const override { return largest; }
     void setWidgetLargestAvailableDisplayMode(NCWidgetDisplayMode value) override {
+        EXPECT_TRUE(RunLoop::isMainThread());
         largest = value;
         _calls.emplace_back(value == NCWidgetDisplayMode::Expanded ? "offers expanded"
                                                                    : "offers compact");
@@ -138,8 +140,11 @@ public:
         : _calls(calls) {}
     void invalidate() override {
         _calls.emplace_back("invalidate");
+        if (whenInvalidated)
+            whenInvalidated();
         OWTransitIncidentUpdater::invalidate();
     }
+    std::function<void()> whenInvalidated;
 
 private:
     Calls& _calls;
@@ -210,6 +215,23 @@ protected:
     }
     static std::shared_ptr<Result> success(NSArray::Elements lines = {}) {
         return Result::resultWithValue(NSArray::arrayWithObjects(std::move(lines)));
+    }
+    /// A line with an advisory of that title, which goes on.
+    static std::shared_ptr<NSObject> disturbedLine(std::uint64_t muid, const char* title) {
+        return makeItem(muid,
+                        NSArray::arrayOf({TransitIncidentRecord::initWithFields(
+                            {.muid = muid + 100, .title = title, .summary = "Some words"})}));
+    }
+    /// The titles of the rows of the present mode that are items.
+    static std::vector<std::string> titles(const OWTransitIncidentDataSource& source) {
+        std::vector<std::string> found;
+        for (std::int64_t row = 0;; ++row) {
+            const auto item = std::dynamic_pointer_cast<OWTransitItem>(
+                source._itemAtIndexPath(NSIndexPath::indexPathForRow_inSection(row, 0)));
+            if (!item || (row > 0 && !source.isExpanded()))
+                return found;
+            found.push_back(item->primaryText().value_or("(nil)"));
+        }
     }
     static std::shared_ptr<NSError> someError() {
         return NSError::errorWithMessage("LookupDomain", 5, "no lookup today");
