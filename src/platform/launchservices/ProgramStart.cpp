@@ -71,7 +71,11 @@ int startProgram(const std::filesystem::path& program,
     posix_spawn_file_actions_adddup2(&actions, standardInput.number(), STDIN_FILENO);
     posix_spawnattr_t attributes;
     posix_spawnattr_init(&attributes);
-    posix_spawnattr_setflags(&attributes, POSIX_SPAWN_SETSID);
+    posix_spawnattr_setflags(&attributes, POSIX_SPAWN_SETSID | POSIX_SPAWN_SETSIGMASK);
+    // Whatever this program blocks for itself: what it starts can be asked to end.
+    sigset_t none;
+    sigemptyset(&none);
+    posix_spawnattr_setsigmask(&attributes, &none);
     pid_t child = 0;
     const int failure =
         posix_spawn(&child, name.c_str(), &actions, &attributes, argv.data(), environ);

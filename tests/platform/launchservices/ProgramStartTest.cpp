@@ -5,6 +5,7 @@
 #include <gtest/gtest.h>
 
 #include <cerrno>
+#include <csignal>
 
 namespace orvo {
 namespace {
@@ -49,6 +50,29 @@ TEST(ProgramStart, ItIsItsOwnSession) {
     long session = 1;
     report >> process >> session;
     EXPECT_EQ(process, session);
+}
+
+TEST(ProgramStart, SignalsThatAreBlockedHereReachIt) {
+    const testing::TemporaryFolder folder;
+    const auto pipe = folder.path() / "pipe";
+    ASSERT_EQ(mkfifo(pipe.c_str(), 0600), 0);
+    sigset_t blocked;
+    sigset_t earlier;
+    sigemptyset(&blocked);
+    sigaddset(&blocked, SIGTERM);
+    pthread_sigmask(SIG_BLOCK, &blocked, &earlier);
+    const int failure =
+        startProgram("/bin/sh",
+                     {"-c",
+                      "while read name value; do test $name = SigBlk: && echo $value; done "
+                      "< /proc/$$/status > " +
+                          pipe.string()},
+                     nullptr);
+    pthread_sigmask(SIG_SETMASK, &earlier, nullptr);
+    ASSERT_EQ(failure, 0);
+    std::string mask;
+    std::ifstream(pipe) >> mask;
+    EXPECT_EQ(mask, "0000000000000000");
 }
 
 } // namespace
