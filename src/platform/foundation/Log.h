@@ -92,8 +92,9 @@ public:
     [[nodiscard]] static std::shared_ptr<Log>
     findOrCreate(const std::string& category, const std::string& subsystem = DefaultSubsystem);
 
-    /// Where lines go. Default: the system journal where standard error is connected to it, else
-    /// standard error; private values redacted, unless `ORVO_LOG` names `private`.
+    /// Where lines go. Default: the system journal; standard error where `ORVO_LOG` says anything,
+    /// unless that is connected to the journal. Private values are redacted, unless `ORVO_LOG`
+    /// names `private`.
     static EnvironmentSlot<LogSink>& sink();
     /// The least level written, by category; `*` is every other category. Default: from `ORVO_LOG`,
     /// as `TransitWidget=debug,Result=error,*=info`; without it nothing below `Default`. A change

@@ -70,7 +70,9 @@ bool isConnectedTo(const char* stream, int fileDescriptor) {
 }
 
 LogSink standard() {
-    const bool journal = isConnectedTo(std::getenv("JOURNAL_STREAM"), STDERR_FILENO);
+    const char* const asked = std::getenv("ORVO_LOG");
+    const bool journal =
+        !asked || !*asked || isConnectedTo(std::getenv("JOURNAL_STREAM"), STDERR_FILENO);
     const bool showsPrivate = LogSettings::ofProcess().showsPrivate;
     return [=](const LogRecord& record) {
         const auto& text = showsPrivate ? record.message : record.redacted;

@@ -16,7 +16,8 @@ line(const LogRecord& record, const std::string& text, double secondsSince1970);
 /// `fileDescriptor` is connected to.
 [[nodiscard]] bool isConnectedTo(const char* stream, int fileDescriptor);
 
-/// To the journal where standard error goes there, else to standard error.
+/// To standard error where `ORVO_LOG` asks for a log and standard error does not go to the journal
+/// anyhow, else to the journal: what a program has to say to the person in front of it is no log.
 [[nodiscard]] LogSink standard();
 
 } // namespace orvo::LogWriter

@@ -6,6 +6,7 @@
 
 #include <cstdlib>
 #include <fcntl.h>
+#include <optional>
 #include <sys/stat.h>
 #include <unistd.h>
 
@@ -44,12 +45,29 @@ TEST(LogWriter, TellsAStreamByDeviceAndInode) {
     EXPECT_FALSE(LogWriter::isConnectedTo(name.c_str(), file));
 }
 
-TEST(LogWriter, WritesRedactedTextToStandardErrorByTheEnvironmentsClock) {
+/// What the standard writer puts on standard error with that value of `ORVO_LOG`.
+std::string standardErrorWith(const char* asked) {
+    const char* const given = std::getenv("ORVO_LOG");
+    const auto earlier = given ? std::optional<std::string>(given) : std::nullopt;
+    setenv("ORVO_LOG", asked, 1);
     const testing::StoppedClock clock(1721784520);
     ::testing::internal::CaptureStderr();
     LogWriter::standard()(record("secret", "<private>"));
-    EXPECT_EQ(::testing::internal::GetCapturedStderr(),
+    auto written = ::testing::internal::GetCapturedStderr();
+    if (earlier)
+        setenv("ORVO_LOG", earlier->c_str(), 1);
+    else
+        unsetenv("ORVO_LOG");
+    return written;
+}
+
+TEST(LogWriter, WritesRedactedTextToStandardErrorByTheEnvironmentsClock) {
+    EXPECT_EQ(standardErrorWith("debug"),
               "2024-07-24T01:28:40Z com.zentu.Orvo Result error: <private>\n");
+}
+
+TEST(LogWriter, LeavesStandardErrorToThePersonWhereNobodyAsksForALog) {
+    EXPECT_EQ(standardErrorWith(""), "");
 }
 
 // The process's own settings are read once, so each of these asks in a process of its own.
