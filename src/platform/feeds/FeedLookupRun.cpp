@@ -63,8 +63,7 @@ std::shared_ptr<NSError> FeedLookupRun::plan() {
         return error;
     if (const auto* wanted = std::get_if<AllLines>(&_question))
         return planFeeds(*wanted, all, *schedules);
-    planLines(all, *schedules);
-    return nullptr;
+    return planLines(all, *schedules);
 }
 
 std::shared_ptr<NSError> FeedLookupRun::planFeeds(const AllLines& wanted,
@@ -78,57 +77,79 @@ std::shared_ptr<NSError> FeedLookupRun::planFeeds(const AllLines& wanted,
             return NSError::errorWithMessage(FeedErrorDomain,
                                              static_cast<std::int64_t>(FeedErrorCode::UnknownFeed),
                                              fmt::format("There is no feed {}.", name));
-        auto& feed = addFeed(*configuration, schedules);
         std::shared_ptr<NSError> unread;
-        const auto lines = schedules.lines(name, &unread);
+        LineNumbers lines;
+        for (const auto& line : schedules.lines(name, &unread)) {
+            lines.push_back(line.muid);
+            _wanted.push_back(line.muid);
+            _lines[line.muid] = {makeTransitLine(line), line.agency.timezone, knownAt(line), {}};
+        }
+        if (!unread)
+            unread = addFeed(*configuration, std::move(lines), schedules);
         if (unread)
             return unread;
-        for (const auto& line : lines) {
-            feed.lines.push_back(line.muid);
-            _wanted.push_back(line.muid);
-            _lines[line.muid] = {makeTransitLine(line), line.agency.timezone, knownAt(line)};
-        }
     }
     return nullptr;
 }
 
-void FeedLookupRun::planLines(const std::vector<FeedConfiguration>& all,
-                              const ScheduleStore& schedules) {
-    std::unordered_map<std::string, std::vector<std::uint64_t>> linesOfFeeds;
+/// What cannot be read of the schedules leaves its lines unknown; nothing is answered where that is
+/// all of them.
+std::shared_ptr<NSError> FeedLookupRun::planLines(const std::vector<FeedConfiguration>& all,
+                                                  const ScheduleStore& schedules) {
+    LinesOfFeeds linesOfFeeds;
     for (const auto muid : _wanted) {
-        if (_lines.contains(muid))
-            continue;
-        if (const auto line = schedules.line(muid)) {
-            _lines[muid] = {makeTransitLine(*line), line->agency.timezone, knownAt(*line)};
-            auto& lines = linesOfFeeds[line->feed];
-            if (line->present)
-                lines.push_back(muid);
-        } else if (auto kept = _ground.lastKnownLine(muid)) {
-            (void)linesOfFeeds[kept->origin().feed]; // the feed is asked, though not for this line
-            _lines[muid] = {std::move(kept), {}, {}};
-        } else {
-            _lines[muid] = {namelessLine(muid), {}, {}};
-        }
+        if (!_lines.contains(muid))
+            _lines[muid] = lineOf(muid, schedules, linesOfFeeds);
     }
     for (const auto& configuration : all) {
-        if (const auto lines = linesOfFeeds.find(configuration.name); lines != linesOfFeeds.end())
-            addFeed(configuration, schedules).lines = std::move(lines->second);
+        const auto lines = linesOfFeeds.find(configuration.name);
+        if (lines == linesOfFeeds.end())
+            continue;
+        if (const auto unread = addFeed(configuration, lines->second, schedules)) {
+            for (const auto muid : lines->second)
+                _lines[muid].unread = unread;
+        }
     }
+    const bool isAnyRead =
+        std::ranges::any_of(_lines, [](const auto& line) { return !line.second.unread; });
+    return isAnyRead ? nullptr : _lines.at(_wanted.front()).unread;
 }
 
-FeedLookupRun::Feed& FeedLookupRun::addFeed(const FeedConfiguration& configuration,
-                                            const ScheduleStore& schedules) {
+FeedLookupRun::Line FeedLookupRun::lineOf(std::uint64_t muid,
+                                          const ScheduleStore& schedules,
+                                          LinesOfFeeds& linesOfFeeds) const {
+    std::shared_ptr<NSError> unread;
+    if (const auto line = schedules.line(muid, &unread)) {
+        auto& lines = linesOfFeeds[line->feed];
+        if (line->present)
+            lines.push_back(muid);
+        return {makeTransitLine(*line), line->agency.timezone, knownAt(*line), {}};
+    }
+    auto kept = _ground.lastKnownLine(muid);
+    if (kept && !unread)
+        (void)linesOfFeeds[kept->origin().feed]; // the feed is asked, though not for this line
+    return {kept ? std::move(kept) : namelessLine(muid), {}, {}, std::move(unread)};
+}
+
+std::shared_ptr<NSError> FeedLookupRun::addFeed(const FeedConfiguration& configuration,
+                                                LineNumbers lines,
+                                                const ScheduleStore& schedules) {
     Feed feed;
     feed.configuration = configuration;
+    feed.lines = std::move(lines);
     feed.sources.resize(configuration.alerts.size());
-    feed.index = schedules.lineIndex(configuration.name);
+    std::shared_ptr<NSError> unread;
+    feed.index = schedules.lineIndex(configuration.name, &unread);
+    if (unread)
+        return unread;
     feed.hasSchedule = feed.index != nullptr;
     if (!feed.index) {
         LineIndex::Contents contents;
         contents.feed = configuration.name;
         feed.index = std::make_shared<const LineIndex>(std::move(contents));
     }
-    return _feeds.emplace_back(std::move(feed));
+    _feeds.push_back(std::move(feed));
+    return nullptr;
 }
 
 void FeedLookupRun::load() {
@@ -226,8 +247,11 @@ std::shared_ptr<NSArray> FeedLookupRun::incidentsOf(const Line& line) const {
                               (system ? system->name() : std::nullopt).value_or(std::string()),
                               line.timeZone};
     UnknownStatus status;
-    status.reason = UnknownStatus::Reason::LineDeparted;
+    status.reason =
+        line.unread ? UnknownStatus::Reason::ScheduleUnread : UnknownStatus::Reason::LineDeparted;
     status.lastKnown = line.knownAt;
+    if (line.unread)
+        status.cause = line.unread->localizedDescription();
     return NSArray::arrayOf<FeedTransitIncident>(
         {makeUnknownIncident(unknown, status, _moment.now, _moment.language)});
 }

@@ -33,7 +33,8 @@ private:
     struct Line {
         std::shared_ptr<FeedTransitLine> line;
         std::string timeZone;
-        std::optional<double> knownAt; // when a schedule that has it came, in seconds since 1970
+        std::optional<double> knownAt;   // when a schedule that has it came, in seconds since 1970
+        std::shared_ptr<NSError> unread; // why its schedule could not be asked; nil when it could
     };
 
     // On worker queues, one after the other.
@@ -42,8 +43,16 @@ private:
     [[nodiscard]] std::shared_ptr<NSError> planFeeds(const AllLines& wanted,
                                                      const std::vector<FeedConfiguration>& all,
                                                      const ScheduleStore& schedules);
-    void planLines(const std::vector<FeedConfiguration>& all, const ScheduleStore& schedules);
-    Feed& addFeed(const FeedConfiguration& configuration, const ScheduleStore& schedules);
+    [[nodiscard]] std::shared_ptr<NSError> planLines(const std::vector<FeedConfiguration>& all,
+                                                     const ScheduleStore& schedules);
+    using LinesOfFeeds = std::unordered_map<std::string, LineNumbers>;
+    /// What is known of a line. It is put among its feed's where it is in the schedule.
+    [[nodiscard]] Line
+    lineOf(std::uint64_t muid, const ScheduleStore& schedules, LinesOfFeeds& linesOfFeeds) const;
+    /// @return why the schedule could not be read: then the feed is not added; nil when it is
+    [[nodiscard]] std::shared_ptr<NSError> addFeed(const FeedConfiguration& configuration,
+                                                   LineNumbers lines,
+                                                   const ScheduleStore& schedules);
     void load();
     void sourceArrived();
     void answer();

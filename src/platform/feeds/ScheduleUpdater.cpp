@@ -155,6 +155,7 @@ ScheduleUpdate ScheduleUpdater::import(const FeedConfiguration& feed,
 
 std::optional<double> ScheduleUpdater::importedAt(const std::string& feed) const {
     const auto schedules = _ground.schedules(nullptr);
+    // A store that cannot be asked is written anew, or tells then what is wrong with it.
     const auto info = schedules ? schedules->info(feed) : std::nullopt;
     return info ? std::optional(info->importedAt) : std::nullopt;
 }

@@ -1,4 +1,6 @@
 #include "platform/feeds/FeedLookupFixture.h"
+#include "platform/sqlite/SQLiteDatabase.h"
+#include "support/LogCapture.h"
 
 #include <gmock/gmock.h>
 
@@ -269,6 +271,54 @@ TEST_F(FeedLookupHonesty, FeedsThatWereNotAskedDoNotCountAsReadable) {
     failWith("city/alerts", "no answer");
     EXPECT_NE(lookUp({city("1")}).error, nullptr);
     EXPECT_THAT(asked, ElementsAre("city/alerts"));
+}
+
+/// A store that can be read but for line 2 of the city.
+class FeedLookupDamage : public FeedLookupHonesty {
+protected:
+    FeedLookupDamage() {
+        addCoast();
+        const auto other = SQLiteDatabase::open(
+            ScheduleStore::defaultPath(), SQLiteDatabase::Mode::Write, nullptr);
+        EXPECT_TRUE(other->execute(R"(
+            ALTER TABLE line RENAME TO sound;
+            CREATE VIEW line AS SELECT muid, feed, agency, route_id, agency_id, short_name,
+                CASE route_id WHEN '2' THEN json('{') ELSE long_name END AS long_name,
+                color, text_color, url, type, position, present, known_at FROM sound)"));
+    }
+
+    testing::LogCapture log;
+};
+
+TEST_F(FeedLookupDamage, ALineThatCannotBeReadIsUnknownAndSaysWhy) {
+    const auto answer = lookUp({city("2"), coast("A")});
+    EXPECT_THAT(statuses(answer), ElementsAre("unknown", "clear"));
+    const auto why = incidents(answer.items[0]).front()->fullDescription().value_or("");
+    EXPECT_THAT(why, HasSubstr("The schedule could not be read."));
+    EXPECT_THAT(why, HasSubstr(ScheduleStore::defaultPath().string()));
+}
+
+TEST_F(FeedLookupDamage, LinesOfAScheduleThatCannotBeReadAreUnknownAndTheOthersKnown) {
+    const auto answer = lookUp({city("1"), coast("A"), city("3")});
+    EXPECT_THAT(statuses(answer), ElementsAre("unknown", "clear", "unknown"));
+    EXPECT_EQ(answer.items[0]->name(), "Line 1");
+    EXPECT_THAT(incidents(answer.items[2]).front()->fullDescription().value_or(""),
+                HasSubstr("The schedule could not be read."));
+    EXPECT_THAT(asked, ElementsAre("coast/alerts"));
+}
+
+TEST_F(FeedLookupDamage, WhereNoLineCanBeReadTheLookupEndsWithTheError) {
+    const auto answer = lookUp({city("1"), city("2")});
+    ASSERT_NE(answer.error, nullptr);
+    EXPECT_THAT(answer.error->localizedDescription(),
+                HasSubstr(ScheduleStore::defaultPath().string()));
+    EXPECT_THAT(answer.items, IsEmpty());
+    EXPECT_THAT(asked, IsEmpty());
+}
+
+TEST_F(FeedLookupDamage, AllLinesOfAFeedThatCannotBeReadAreAnError) {
+    EXPECT_NE(lookUpFeeds().error, nullptr);
+    EXPECT_EQ(lookUpFeeds(std::vector<std::string>{"coast"}).error, nullptr);
 }
 
 } // namespace

@@ -26,7 +26,7 @@ struct IncidentWords::Table {
     std::string_view systemAndRest;
     std::string_view moment;
     Count minutes, hours, days;
-    std::string_view sourceFailed, selectorLost, lineDeparted, nothingToAsk;
+    std::string_view sourceFailed, selectorLost, lineDeparted, scheduleUnread, nothingToAsk;
 };
 
 namespace {
@@ -70,6 +70,7 @@ constexpr std::array<IncidentWords::Table, 2> Tables = {{
      "The service alerts could not be read.",
      "A service alert could not be read in full. It may concern this line.",
      "This line is not in the current schedule.",
+     "The schedule could not be read.",
      "There is no source of service alerts for this line."},
     {"de",
      {"Hinweis zum Betrieb",
@@ -109,6 +110,7 @@ constexpr std::array<IncidentWords::Table, 2> Tables = {{
      "Die Betriebsmeldungen konnten nicht gelesen werden.",
      "Eine Betriebsmeldung konnte nicht ganz gelesen werden. Sie kann diese Linie betreffen.",
      "Diese Linie steht nicht im aktuellen Fahrplan.",
+     "Der Fahrplan konnte nicht gelesen werden.",
      "Für diese Linie gibt es keine Quelle von Betriebsmeldungen."},
 }};
 
@@ -189,6 +191,10 @@ std::string IncidentWords::selectorLost() const {
 
 std::string IncidentWords::lineDeparted() const {
     return std::string(_table->lineDeparted);
+}
+
+std::string IncidentWords::scheduleUnread() const {
+    return std::string(_table->scheduleUnread);
 }
 
 std::string IncidentWords::nothingToAsk() const {

@@ -28,6 +28,7 @@ public:
     [[nodiscard]] std::string sourceFailed() const;
     [[nodiscard]] std::string selectorLost() const;
     [[nodiscard]] std::string lineDeparted() const;
+    [[nodiscard]] std::string scheduleUnread() const;
     [[nodiscard]] std::string nothingToAsk() const;
 
     struct Table;

@@ -28,6 +28,8 @@ std::string reasonInWords(const UnknownStatus& status, const IncidentWords& word
         return words.selectorLost();
     case UnknownStatus::Reason::LineDeparted:
         return words.lineDeparted();
+    case UnknownStatus::Reason::ScheduleUnread:
+        return words.scheduleUnread();
     case UnknownStatus::Reason::NothingToAsk:
         return words.nothingToAsk();
     }

@@ -20,10 +20,11 @@ struct UnknownLine {
 /// What is not known of a line, and why.
 struct UnknownStatus {
     enum class Reason {
-        SourceFailed, ///< a source of alerts could not be read, or not recently enough
-        SelectorLost, ///< some alert may concern the line, but its selectors were unreadable
-        LineDeparted, ///< the line is no longer in the schedule, or its feed was removed
-        NothingToAsk, ///< the feed has no source of alerts
+        SourceFailed,   ///< a source of alerts could not be read, or not recently enough
+        SelectorLost,   ///< some alert may concern the line, but its selectors were unreadable
+        LineDeparted,   ///< the line is no longer in the schedule, or its feed was removed
+        ScheduleUnread, ///< the schedule could not be read
+        NothingToAsk,   ///< the feed has no source of alerts
     };
     Reason reason = Reason::SourceFailed;
     /// When what is known was last got, in seconds since 1970; nothing when never.

@@ -15,6 +15,8 @@ constexpr const char* SelectLines = R"(
     FROM line JOIN feed ON feed.number = line.feed JOIN agency ON agency.number = line.agency
 )";
 
+constexpr std::int64_t Unread = -1; // no schedule is of this generation
+
 ScheduleLine lineAt(const SQLiteStatement& row) {
     int column = 0;
     ScheduleLine line;
@@ -167,7 +169,9 @@ const LineTranslator& ScheduleQueries::translator(const std::string& feed,
     const std::string own = isKnown ? select.rows.text(2) : std::string();
     const auto offered =
         isKnown ? translations(select.rows.integer(0)) : std::vector<ScheduleTranslation>();
-    Translator made{generation, language, LineTranslator(offered, own, language)};
+    // One that could not be read in full is not taken for that generation's again.
+    Translator made{
+        _hasFailed ? Unread : generation, language, LineTranslator(offered, own, language)};
     return _translators.insert_or_assign(feed, std::move(made)).first->second.translator;
 }
 

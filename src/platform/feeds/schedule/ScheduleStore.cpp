@@ -179,14 +179,15 @@ std::shared_ptr<ScheduleStore> ScheduleStore::open(const std::filesystem::path& 
     return std::shared_ptr<ScheduleStore>(new ScheduleStore(std::move(implementation)));
 }
 
-std::vector<std::string> ScheduleStore::feeds() const {
+std::vector<std::string> ScheduleStore::feeds(std::shared_ptr<NSError>* error) const {
     return _implementation->answer<std::vector<std::string>>(
-        [](ScheduleQueries& queries) { return queries.feeds(); });
+        [](ScheduleQueries& queries) { return queries.feeds(); }, error);
 }
 
-std::optional<ScheduleInfo> ScheduleStore::info(std::string_view feed) const {
+std::optional<ScheduleInfo> ScheduleStore::info(std::string_view feed,
+                                                std::shared_ptr<NSError>* error) const {
     return _implementation->answer<std::optional<ScheduleInfo>>(
-        [feed](ScheduleQueries& queries) { return queries.info(feed); });
+        [feed](ScheduleQueries& queries) { return queries.info(feed); }, error);
 }
 
 std::vector<ScheduleLine> ScheduleStore::lines(std::string_view feed,
@@ -198,17 +199,20 @@ std::vector<ScheduleLine> ScheduleStore::lines(std::string_view feed,
         error);
 }
 
-std::optional<ScheduleLine> ScheduleStore::line(std::uint64_t muid) const {
+std::optional<ScheduleLine> ScheduleStore::line(std::uint64_t muid,
+                                                std::shared_ptr<NSError>* error) const {
     auto lines = _implementation->answer<std::vector<ScheduleLine>>(
         [muid, locale = Text::locale().get()](ScheduleQueries& queries) {
             return queries.translated(queries.linesWithMuid(muid), locale);
-        });
+        },
+        error);
     if (lines.empty())
         return std::nullopt;
     return std::move(lines.front());
 }
 
-std::shared_ptr<const LineIndex> ScheduleStore::lineIndex(std::string_view feed) const {
+std::shared_ptr<const LineIndex> ScheduleStore::lineIndex(std::string_view feed,
+                                                          std::shared_ptr<NSError>* error) const {
     return _implementation->answer<std::shared_ptr<const LineIndex>>(
         [feed,
          self = shared_from_this()](ScheduleQueries& queries) -> std::shared_ptr<const LineIndex> {
@@ -229,7 +233,8 @@ std::shared_ptr<const LineIndex> ScheduleStore::lineIndex(std::string_view feed)
                     [&](ScheduleQueries& later) { return later.stopName(name, stop); });
             };
             return std::make_shared<const LineIndex>(std::move(contents));
-        });
+        },
+        error);
 }
 
 std::vector<ScheduleLine> ScheduleStore::search(std::string_view text,
@@ -244,12 +249,14 @@ std::vector<ScheduleLine> ScheduleStore::search(std::string_view text,
     return LineSearch(locale).best(std::move(lines), text, limit);
 }
 
-std::vector<ScheduleLine> ScheduleStore::linesNamed(std::string_view name) const {
+std::vector<ScheduleLine> ScheduleStore::linesNamed(std::string_view name,
+                                                    std::shared_ptr<NSError>* error) const {
     const std::string locale = Text::locale().get();
-    auto lines =
-        _implementation->answer<std::vector<ScheduleLine>>([&locale](ScheduleQueries& queries) {
+    auto lines = _implementation->answer<std::vector<ScheduleLine>>(
+        [&locale](ScheduleQueries& queries) {
             return queries.translated(queries.allLines(), locale);
-        });
+        },
+        error);
     return LineSearch(locale).named(std::move(lines), name);
 }
 

@@ -21,9 +21,9 @@ namespace orvo {
 /// reads sees a schedule as it was before or after an import, never in between.
 ///
 /// Names are answered in the person's language (`Text::locale()`) where the schedule translates
-/// them, else in the schedule's own. A read that fails is logged and answers as if nothing were
-/// known; `error`, where a question takes one (it may be nil), is then set and otherwise left as it
-/// is. What an index asks later tells such a failure from a stop without lines.
+/// them, else in the schedule's own. A read that fails is logged, answers nothing, and sets `error`
+/// (which may be nil), which is otherwise left as it is: who would take nothing for an answer asks
+/// with an error. What an index asks later tells such a failure from a stop without lines.
 ///
 /// While `Environment::keepsWritesInMemory()` holds, the file is only read; the first change
 /// continues on a copy in memory.
@@ -41,17 +41,20 @@ public:
     ~ScheduleStore();
 
     /// The short names of all feeds that have a schedule, in order of name.
-    [[nodiscard]] std::vector<std::string> feeds() const;
+    [[nodiscard]] std::vector<std::string> feeds(std::shared_ptr<NSError>* error = nullptr) const;
     /// Nothing for a feed without a schedule.
-    [[nodiscard]] std::optional<ScheduleInfo> info(std::string_view feed) const;
+    [[nodiscard]] std::optional<ScheduleInfo> info(std::string_view feed,
+                                                   std::shared_ptr<NSError>* error = nullptr) const;
     /// The feed's lines in the schedule's order; only those that are in the schedule.
     [[nodiscard]] std::vector<ScheduleLine> lines(std::string_view feed,
                                                   std::shared_ptr<NSError>* error = nullptr) const;
     /// The line, whether in its schedule or departed; nothing when it was never known.
-    [[nodiscard]] std::optional<ScheduleLine> line(std::uint64_t muid) const;
+    [[nodiscard]] std::optional<ScheduleLine> line(std::uint64_t muid,
+                                                   std::shared_ptr<NSError>* error = nullptr) const;
     /// What the alert rules need of a feed; names are the schedule's own, never translated. Nil for
     /// a feed without a schedule.
-    [[nodiscard]] std::shared_ptr<const LineIndex> lineIndex(std::string_view feed) const;
+    [[nodiscard]] std::shared_ptr<const LineIndex>
+    lineIndex(std::string_view feed, std::shared_ptr<NSError>* error = nullptr) const;
 
     /// The lines in which each word of `text` stands, in the short name, the long name or the
     /// agency's name, best first: the very short name, the very long name, the beginning of the
@@ -63,7 +66,8 @@ public:
                                                    std::shared_ptr<NSError>* error = nullptr) const;
     /// The lines whose short or long name is `name`, by feed and in the schedule's order. Case and
     /// accents do not count.
-    [[nodiscard]] std::vector<ScheduleLine> linesNamed(std::string_view name) const;
+    [[nodiscard]] std::vector<ScheduleLine>
+    linesNamed(std::string_view name, std::shared_ptr<NSError>* error = nullptr) const;
 
     /// Reads the schedule whole and then puts it in the place of the feed's earlier one, in one
     /// transaction. A line that is not in the new one stays known with `present` false.

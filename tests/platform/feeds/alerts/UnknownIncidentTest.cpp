@@ -70,6 +70,7 @@ TEST(UnknownIncident, SaysWhy) {
     EXPECT_TRUE(why(Reason::SourceFailed).ends_with("The service alerts could not be read."));
     EXPECT_TRUE(why(Reason::SelectorLost).ends_with("It may concern this line."));
     EXPECT_TRUE(why(Reason::LineDeparted).ends_with("not in the current schedule."));
+    EXPECT_TRUE(why(Reason::ScheduleUnread).ends_with("The schedule could not be read."));
     EXPECT_TRUE(why(Reason::NothingToAsk).ends_with("no source of service alerts for this line."));
 }
 

@@ -12,6 +12,8 @@
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
+#include <utility>
+
 namespace orvo {
 namespace {
 
@@ -20,6 +22,7 @@ using testing::Files;
 using ::testing::HasSubstr;
 using ::testing::IsEmpty;
 using ::testing::Optional;
+using ::testing::SizeIs;
 
 class ScheduleStoreTest : public ::testing::Test {
 protected:
@@ -257,6 +260,69 @@ TEST_F(ScheduleStoreTest, LinesThatCannotBeReadAreAnErrorAndNotNone) {
     error = nullptr;
     EXPECT_THAT(store->search("gare", 5, &error), IsEmpty());
     EXPECT_TRUE(error);
+}
+
+TEST_F(ScheduleStoreTest, NothingThatCannotBeReadIsTakenForNothingThere) {
+    ASSERT_EQ(import(testing::smallSchedule()), "");
+    const auto muid = lineMuid("city", "R1");
+    EXPECT_THAT(store->feeds(&error), ElementsAre("city"));
+    EXPECT_TRUE(store->info("city", &error));
+    EXPECT_FALSE(store->info("nowhere", &error));
+    EXPECT_TRUE(store->line(muid, &error));
+    EXPECT_FALSE(store->line(7, &error));
+    EXPECT_TRUE(store->lineIndex("city", &error));
+    EXPECT_FALSE(store->lineIndex("nowhere", &error));
+    EXPECT_THAT(store->linesNamed("T2", &error), SizeIs(1));
+    EXPECT_THAT(store->linesNamed("no such name", &error), IsEmpty());
+    EXPECT_FALSE(error);
+    const auto other = SQLiteDatabase::open(path(), SQLiteDatabase::Mode::Write, nullptr);
+    ASSERT_TRUE(other->execute("DROP TABLE feed"));
+    const testing::LogCapture log;
+    const auto said = [&] {
+        const auto given = std::exchange(error, nullptr);
+        return given ? given->localizedDescription() : "(null)";
+    };
+    EXPECT_THAT(store->feeds(&error), IsEmpty());
+    EXPECT_THAT(said(), HasSubstr(path().string() + ": "));
+    EXPECT_FALSE(store->info("city", &error));
+    EXPECT_THAT(said(), HasSubstr(path().string() + ": "));
+    EXPECT_FALSE(store->line(muid, &error));
+    EXPECT_THAT(said(), HasSubstr(path().string() + ": "));
+    EXPECT_FALSE(store->lineIndex("city", &error));
+    EXPECT_THAT(said(), HasSubstr(path().string() + ": "));
+    EXPECT_THAT(store->linesNamed("T2", &error), IsEmpty());
+    EXPECT_THAT(said(), HasSubstr(path().string() + ": "));
+}
+
+TEST_F(ScheduleStoreTest, AFileThatWasCutIsAnErrorAndNotAnEmptyStore) {
+    ASSERT_EQ(import(testing::smallSchedule()), "");
+    store = nullptr;
+    const auto size = std::filesystem::file_size(path());
+    std::filesystem::resize_file(path(), size / 2);
+    const testing::LogCapture log;
+    const auto cut = ScheduleStore::open(path(), &error);
+    EXPECT_THAT(cut ? cut->lines("city", &error) : std::vector<ScheduleLine>(), IsEmpty());
+    ASSERT_TRUE(error);
+    EXPECT_THAT(error->localizedDescription(), HasSubstr(path().string() + ": "));
+    EXPECT_THAT(error->localizedDescription(), HasSubstr("orvo feeds update"));
+}
+
+TEST_F(ScheduleStoreTest, NamesThatCouldNotBeTranslatedOnceAreTranslatedLater) {
+    auto files = testing::smallSchedule();
+    files.emplace_back("translations.txt",
+                       "table_name,field_name,language,translation,record_id\n"
+                       "routes,route_long_name,nl,Ziekenhuis,R2\n");
+    ASSERT_EQ(import(files), "");
+    const auto dutch = Text::locale().overrideWith("nl");
+    const auto other = SQLiteDatabase::open(path(), SQLiteDatabase::Mode::Write, nullptr);
+    ASSERT_TRUE(other->execute("ALTER TABLE translation RENAME TO away"));
+    {
+        const testing::LogCapture log;
+        EXPECT_FALSE(store->line(lineMuid("city", "R2"), &error));
+        EXPECT_TRUE(error);
+    }
+    ASSERT_TRUE(other->execute("ALTER TABLE away RENAME TO translation"));
+    EXPECT_EQ(store->line(lineMuid("city", "R2"))->longName, "Ziekenhuis");
 }
 
 TEST_F(ScheduleStoreTest, AnswersNamesInThePersonsLanguage) {
