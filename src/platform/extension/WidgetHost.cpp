@@ -6,6 +6,7 @@
 #include "platform/extension/_TransitionBlocks.h"
 #include "platform/extension/_WidgetContext.h"
 #include "platform/foundation/DispatchQueue.h"
+#include "platform/foundation/NSNotificationCenter.h"
 #include "platform/uikit/UIFontDescriptor.h"
 #include "platform/uikit/UIViewController.h"
 #include "platform/uikit/table/UIScrollView.h"
@@ -40,6 +41,13 @@ CGFloat contentHeightOf(const UIView& view) {
         bottom = std::max(bottom, frame.origin.y + height);
     }
     return bottom;
+}
+
+/// How many whole rows the expanded widget has room for.
+double rowsWithin(const _WidgetContext& context) {
+    return std::floor(
+        context.widgetMaximumSizeForDisplayMode(NCWidgetDisplayMode::Expanded).height /
+        context.widgetMaximumSizeForDisplayMode(NCWidgetDisplayMode::Compact).height);
 }
 
 std::shared_ptr<UIView> outermost(std::shared_ptr<UIView> view) {
@@ -346,8 +354,23 @@ void WidgetHost::setTraits(const UITraitCollection& traits) {
         return;
     {
         const Hold hold(*this);
+        const auto rows = rowsWithin(*_context);
         updateMaxima(traits.preferredContentSizeCategory);
+        // A widget that hears of another row height and of another number of rows at once takes the
+        // second to be all that matters. So it hears of one after the other.
+        const auto compact =
+            _context->widgetMaximumSizeForDisplayMode(NCWidgetDisplayMode::Compact);
+        const auto expanded =
+            _context->widgetMaximumSizeForDisplayMode(NCWidgetDisplayMode::Expanded);
+        const bool isOtherCount = rowsWithin(*_context) != rows;
+        if (isOtherCount)
+            _context->setMaxima(compact, {expanded.width, rows * compact.height});
         UITraitCollection::setSystem(traits);
+        if (isOtherCount) {
+            _context->setMaxima(compact, expanded);
+            NSNotificationCenter::defaultCenter()->postNotificationName_object(
+                UIContentSizeCategoryDidChangeNotification, nullptr);
+        }
         if (_controller->isViewLoaded())
             outermost(_controller->view())->_traitsDidChange(previous);
     }

@@ -101,25 +101,41 @@ TEST_F(WidgetHostTest, TheExpandedMaximumIsTheFreeHeightUnlessRowsAreSaid) {
     EXPECT_EQ(expanded({.maxRows = 0}), CGSize(359, 0)) << "no limit";
 }
 
+/// Notes what the maximum heights are whenever the text size is told.
+class MaximaListener final : public NSObject {
+public:
+    [[nodiscard]] Method methodForSelector(const Selector&) override {
+        return [this](const std::shared_ptr<NSObject>&) {
+            seen.emplace_back(context->widgetMaximumSizeForDisplayMode(Mode::Compact).height,
+                              context->widgetMaximumSizeForDisplayMode(Mode::Expanded).height);
+            return nullptr;
+        };
+    }
+    static std::shared_ptr<MaximaListener> listening(std::shared_ptr<NSExtensionContext> context) {
+        auto listener = std::make_shared<MaximaListener>();
+        listener->context = std::move(context);
+        NSNotificationCenter::defaultCenter()->addObserver_selector_name_object(
+            listener, Selector("changed"), UIContentSizeCategoryDidChangeNotification, nullptr);
+        return listener;
+    }
+
+    std::shared_ptr<NSExtensionContext> context;
+    std::vector<std::pair<double, double>> seen;
+};
+
 TEST_F(WidgetHostTest, MaximaChangeBeforeTheTextSizeIsPosted) {
-    class Listener final : public NSObject {
-    public:
-        [[nodiscard]] Method methodForSelector(const Selector&) override {
-            return [this](const std::shared_ptr<NSObject>&) {
-                seen = context->widgetMaximumSizeForDisplayMode(Mode::Compact);
-                return nullptr;
-            };
-        }
-        std::shared_ptr<NSExtensionContext> context;
-        CGSize seen;
-    };
     const auto held = host();
-    const auto listener = std::make_shared<Listener>();
-    listener->context = widget->extensionContext();
-    NSNotificationCenter::defaultCenter()->addObserver_selector_name_object(
-        listener, Selector("changed"), UIContentSizeCategoryDidChangeNotification, nullptr);
+    const auto listener = MaximaListener::listening(widget->extensionContext());
     held->setTraits(traits(UIContentSizeCategory::XL));
-    EXPECT_EQ(listener->seen, CGSize(359, 123));
+    EXPECT_EQ(listener->seen, (std::vector{std::pair(123.0, 5.6 * 123)}));
+}
+
+TEST_F(WidgetHostTest, AnotherRowHeightIsToldBeforeAnotherNumberOfRows) {
+    const auto held = host({.freeHeight = 1000});
+    const auto listener = MaximaListener::listening(widget->extensionContext());
+    held->setTraits(traits(UIContentSizeCategory::XL));
+    EXPECT_EQ(listener->seen, (std::vector{std::pair(123.0, 9 * 123.0), std::pair(123.0, 1000.0)}));
+    EXPECT_EQ(held->maximumSizeForDisplayMode(Mode::Expanded).height, 1000);
 }
 
 TEST_F(WidgetHostTest, ChangingTheModeIsOneChangeOfSizeToldBeforeItHappens) {

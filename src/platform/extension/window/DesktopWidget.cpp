@@ -1,8 +1,12 @@
 #include "platform/extension/window/DesktopWidget.h"
 
+#include "platform/extension/WidgetCard.h"
 #include "platform/extension/window/WidgetWindow.h"
 #include "platform/foundation/DispatchQueue.h"
 #include "platform/foundation/RunLoop.h"
+
+#include <QGuiApplication>
+#include <QScreen>
 
 namespace orvo {
 
@@ -12,7 +16,11 @@ std::shared_ptr<WidgetHost> hostWithLooks(const Extension& extension,
                                           const WidgetHostSettings& settings,
                                           const DesktopAppearance& appearance) {
     UITraitCollection::setSystem(appearance.appliedTo(UITraitCollection::system().get()));
-    return WidgetHost::hostWithExtension_settings(extension, settings);
+    auto onScreen = settings;
+    // The first frame has as many rows as the screen has room for, not fewer.
+    if (const auto* const screen = QGuiApplication::primaryScreen())
+        onScreen.freeHeight = screen->availableGeometry().height() - WidgetCard::HeaderHeight;
+    return WidgetHost::hostWithExtension_settings(extension, onScreen);
 }
 
 } // namespace
