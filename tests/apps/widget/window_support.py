@@ -1,0 +1,360 @@
+"""A display, an accessibility bus and a feed of one's own, for tests of the widget's window."""
+
+import http.server
+import os
+import pathlib
+import shutil
+import signal
+import struct
+import subprocess
+import sys
+import tempfile
+import threading
+import time
+import unittest
+
+from handing import NAME, BusTest
+from support import feed
+from widget_support import NOW, WIDGET, WidgetTest, alert, period, selector, text
+
+PATIENCE = float(os.environ.get("ORVO_TEST_PATIENCE", "90"))  # seconds, for machines that do much besides
+ACCESSIBLE = "org.a11y.atspi.Accessible"
+PROPERTIES = "org.freedesktop.DBus.Properties"
+REGISTRY = ("org.a11y.atspi.Registry", "/org/a11y/atspi/accessible/root")
+BUS_LAUNCHERS = ("/usr/libexec/at-spi-bus-launcher", "/usr/lib/at-spi2-core/at-spi-bus-launcher")
+SERVICE = "[D-BUS Service]\nName={}\nExec={}\n"
+CARD_WIDTH, COMPACT_HEIGHT = 359, 146
+
+
+class AlertServer(http.server.ThreadingHTTPServer):
+    """Serves alerts that a test changes, and counts who asks."""
+
+    daemon_threads = True
+
+    def __init__(self):
+        super().__init__(("127.0.0.1", 0), AlertHandler)
+        self.content = feed(NOW)
+        self.asked = 0
+        self.fails = False
+        self.may_answer = threading.Event()
+        self.may_answer.set()
+        threading.Thread(target=self.serve_forever, kwargs={"poll_interval": 0.02}, daemon=True).start()
+
+    @property
+    def url(self):
+        return f"http://127.0.0.1:{self.server_port}/alerts.pb"
+
+    def tell(self, *alerts):
+        self.content = feed(int(time.time()), *alerts)
+
+    def end(self):
+        self.may_answer.set()
+        self.shutdown()
+        self.server_close()
+
+    def handle_error(self, request, client_address):
+        pass  # a widget that is killed in the middle
+
+
+class AlertHandler(http.server.BaseHTTPRequestHandler):
+    def do_GET(self):
+        self.server.asked += 1
+        self.server.may_answer.wait(PATIENCE)
+        content = self.server.content
+        self.send_response(503 if self.server.fails else 200)
+        self.send_header("Content-Length", str(len(content)))
+        self.end_headers()
+        self.wfile.write(content)
+
+    def log_message(self, *words):
+        pass
+
+
+class Part:
+    """An element that assistive tools are told of."""
+
+    def __init__(self, connection, name, path):
+        self._connection, self._name, self._path = connection, name, path
+
+    def _call(self, interface, method, *arguments):
+        proxy = self._connection.get_object(self._name, self._path, introspect=False)
+        return proxy.get_dbus_method(method, interface)(*arguments)
+
+    @property
+    def title(self):
+        return str(self._call(PROPERTIES, "Get", ACCESSIBLE, "Name"))
+
+    @property
+    def role(self):
+        return str(self._call(ACCESSIBLE, "GetRoleName"))
+
+    @property
+    def children(self):
+        return [Part(self._connection, *reference) for reference in self._call(ACCESSIBLE, "GetChildren")]
+
+    @property
+    def process(self):
+        bus = self._connection.get_object("org.freedesktop.DBus", "/org/freedesktop/DBus", introspect=False)
+        return int(bus.GetConnectionUnixProcessID(self._name, dbus_interface="org.freedesktop.DBus"))
+
+    @property
+    def states(self):
+        low, high = self._call(ACCESSIBLE, "GetState")
+        return int(low) | int(high) << 32
+
+    @property
+    def is_focused(self):
+        return bool(self.states >> 12 & 1)  # ATSPI_STATE_FOCUSED
+
+    @property
+    def actions(self):
+        return [str(name) for name, *_ in self._call("org.a11y.atspi.Action", "GetActions")]
+
+    @property
+    def middle(self):
+        x, y, width, height = map(int, self._call("org.a11y.atspi.Component", "GetExtents", 0))
+        return x + width // 2, y + height // 2
+
+    def press(self):
+        self._call("org.a11y.atspi.Action", "DoAction", 0)
+
+
+def parts_of(root):
+    """The element and all below it."""
+    found = [root]
+    for child in root.children:
+        found += parts_of(child)
+    return found
+
+
+class WindowTest(BusTest, WidgetTest):
+    """The widget in a window of a display that nobody looks at, beside a session bus with assistive tools."""
+
+    @classmethod
+    def setUpClass(cls):
+        for program in ("Xvfb", "xdotool", "dbus-daemon"):
+            if not shutil.which(program):
+                raise unittest.SkipTest(f"there is no {program}")
+        cls.launcher = next((path for path in BUS_LAUNCHERS if os.path.exists(path)), None)
+        if not cls.launcher:
+            raise unittest.SkipTest("there is no at-spi-bus-launcher (at-spi2-core)")
+        try:
+            import dbus
+        except ImportError as error:
+            raise unittest.SkipTest("there is no python3-dbus") from error
+        cls.dbus = dbus
+        cls.start_display()
+
+    @classmethod
+    def start_display(cls):
+        told, tells = os.pipe()
+        folder = tempfile.TemporaryDirectory(prefix="orvo-display-")
+        cls.addClassCleanup(folder.cleanup)
+        cls.pixels = pathlib.Path(folder.name) / "Xvfb_screen0"
+        display = subprocess.Popen(["Xvfb", "-displayfd", str(tells), "-screen", "0", "1280x1024x24", "-nolisten", "tcp",
+                                    "-noreset", "-fbdir", folder.name],
+                                   pass_fds=[tells], stdout=subprocess.DEVNULL, stderr=subprocess.DEVNULL)
+        cls.addClassCleanup(display.wait)
+        cls.addClassCleanup(display.terminate)
+        os.close(tells)
+        with os.fdopen(told) as answer:
+            cls.display = ":" + answer.readline().strip()
+
+    def start_bus(self):
+        runtime = self.home / "runtime"
+        runtime.mkdir(mode=0o700)
+        self.environment["XDG_RUNTIME_DIR"] = str(runtime)
+        # The bus starts services without a display: none of them shows anything here.
+        for name in ("QT_QPA_PLATFORM", "DISPLAY", "WAYLAND_DISPLAY"):
+            self.environment.pop(name, None)
+        self.environment["GSETTINGS_BACKEND"] = "memory"  # else what is switched on is asked of a service that is not there
+        services = self.home / "services"
+        services.mkdir()
+        self.write_service(services, f'"{os.environ["ORVO_PROGRAM"]}" service --idle 600')
+        (services / "org.a11y.Bus.service").write_text(SERVICE.format("org.a11y.Bus", self.launcher))
+        self.bus_with(f"<servicedir>{services}</servicedir>")
+        self.session = self.connect(self.environment["DBUS_SESSION_BUS_ADDRESS"])
+        tools = self.session.get_object("org.a11y.Bus", "/org/a11y/bus", introspect=False)
+        for switch in ("IsEnabled", "ScreenReaderEnabled"):
+            tools.Set("org.a11y.Status", switch, self.dbus.Boolean(True, variant_level=1), dbus_interface=PROPERTIES)
+        self.tools = self.connect(str(tools.GetAddress(dbus_interface="org.a11y.Bus")))
+        self.environment["DBUS_SYSTEM_BUS_ADDRESS"] = "disabled:"
+
+    def system_bus(self):
+        """The address of a bus in the place of the machine's, for what is opened from now on."""
+        bus = subprocess.Popen(["dbus-daemon", f"--config-file={self.home}/bus.conf", "--nofork", "--print-address",
+                                f"--address=unix:path={self.home}/system"],
+                               env=self.environment, stdout=subprocess.PIPE, stderr=subprocess.DEVNULL)
+        self.addCleanup(self.end, bus)
+        self.environment["DBUS_SYSTEM_BUS_ADDRESS"] = bus.stdout.readline().decode().strip()
+        return self.environment["DBUS_SYSTEM_BUS_ADDRESS"]
+
+    def connect(self, address):
+        connection = self.dbus.bus.BusConnection(address)
+        self.addCleanup(connection.close)
+        return connection
+
+    def live_feed(self, *alerts):
+        """The person's own feed, whose alerts come from a server that tells these first."""
+        self.server = AlertServer()
+        self.addCleanup(self.server.end)
+        self.server.tell(*alerts)
+        self.orvo("feeds", "add", "city", "--static", self.schedule(), "--alerts", self.server.url)
+        self.orvo("favorites", "add", *(f"city:r{number}" for number in (1, 2, 3)))
+        self.server.asked = 0
+
+    # The widget
+
+    def open_widget(self, *words, **environment):
+        process = subprocess.Popen([WIDGET, *words], cwd=self.home, stdout=subprocess.PIPE, stderr=subprocess.PIPE,
+                                   env={**self.environment, "DISPLAY": self.display, **environment})
+        for cleanup in (process.stdout.close, process.stderr.close, process.wait, process.kill):
+            self.addCleanup(cleanup)
+        self.process = process
+        self.eventually(lambda: self.parts("list"), "the widget tells assistive tools of its rows")
+        self.window = self.xdotool("search", "--all", "--onlyvisible", "--pid", str(process.pid), "--name", ".").split()[0]
+        self.xdotool("windowfocus", "--sync", self.window)
+        return process
+
+    def close_widget(self, how=signal.SIGTERM):
+        """As the person's closing; nothing was said."""
+        self.process.send_signal(how)
+        self.has_closed()
+
+    def has_closed(self):
+        out, err = self.process.communicate(timeout=PATIENCE)
+        self.assertEqual((self.process.returncode, out, err), (0, b"", b""))
+
+    def kill_widget(self):
+        self.process.kill()
+        self.process.wait(PATIENCE)
+
+    def eventually(self, look, what):
+        """Until it holds; answers what was seen."""
+        deadline = time.monotonic() + PATIENCE
+        while True:
+            try:
+                seen = look()
+            except self.dbus.DBusException:
+                seen = None  # it went while it was asked
+            if seen:
+                return seen
+            if self.process.poll() is not None:
+                self.fail(f"{what}: the widget has ended: {self.process.stderr.read().decode()}")
+            if time.monotonic() > deadline:
+                self.fail(f"not so: {what}")
+            time.sleep(0.02)
+
+    # What it shows
+
+    def parts(self, role):
+        """Its elements of that role."""
+        root = Part(self.tools, *REGISTRY)
+        own = [child for child in root.children if child.process == self.process.pid]
+        return [part for application in own for part in parts_of(application) if part.role == role]
+
+    def rows(self):
+        """The spoken titles of its rows."""
+        return [row.title for row in self.parts("list item")]
+
+    def shows(self, *starts):
+        """Until its rows begin so, and are no more."""
+        def look():
+            rows = self.rows()
+            self.seen = rows
+            return len(rows) == len(starts) and all(row.startswith(start) for row, start in zip(rows, starts))
+        try:
+            self.eventually(look, f"the rows begin with {starts}")
+        except AssertionError as error:
+            raise AssertionError(f"{error}; they are {self.seen}") from None
+
+    def button(self):
+        (button,) = self.parts("push button")
+        return button
+
+    def height(self):
+        geometry = self.xdotool("getwindowgeometry", "--shell", self.window).split()
+        return int(dict(line.split("=") for line in geometry)["HEIGHT"])
+
+    def is_high(self, height):
+        self.eventually(lambda: self.height() == height, f"the window is {height} high")
+
+    def color_at(self, x, y):
+        """Of the display's pixel, as #rrggbb."""
+        with self.pixels.open("rb") as file:
+            header = struct.unpack(">25I", file.read(100))
+            start, width, colors = header[0], header[12], header[19]
+            file.seek(start + 12 * colors + y * width + 4 * x)
+            blue, green, red, _ = file.read(4)
+        return f"#{red:02x}{green:02x}{blue:02x}"
+
+    # What a person does
+
+    def xdotool(self, *words):
+        return subprocess.run(["xdotool", *words], env={**self.environment, "DISPLAY": self.display}, check=True,
+                              capture_output=True, text=True, timeout=PATIENCE).stdout
+
+    def click(self, part):
+        x, y = part.middle
+        self.xdotool("mousemove", "--sync", str(x), str(y), "click", "1")
+
+    def keys(self, *names):
+        self.xdotool("key", "--delay", "30", *names)
+
+    def handed_over(self):
+        """What `orvo` shows of the last tap."""
+        return self.run_orvo("show").out
+
+
+class MockService:
+    """Stands in for a service of the desktop, on the bus at that address."""
+
+    def __init__(self, test, address, name, path, interface):
+        self._test, self._name, self._path, self._interface = test, name, path, interface
+        environment = {**test.environment, "DBUS_SESSION_BUS_ADDRESS": address}
+        process = subprocess.Popen([sys.executable, "-m", "dbusmock", name, path, interface], env=environment,
+                                   stdout=subprocess.DEVNULL, stderr=subprocess.DEVNULL)
+        test.addCleanup(process.wait)
+        test.addCleanup(process.terminate)
+        self._process = process
+        subprocess.run(["gdbus", "wait", "--session", "--timeout", str(int(PATIENCE)), name], env=environment, check=True)
+        self._connection = test.connect(address)
+
+    def end(self):
+        self._process.terminate()
+        self._process.wait(PATIENCE)
+
+    def _mock(self, method, *arguments):
+        return self._connection.get_object(self._name, self._path, introspect=False).get_dbus_method(
+            method, "org.freedesktop.DBus.Mock")(*arguments)
+
+    def add_object(self, path, interface, properties):
+        dbus = self._test.dbus
+        self._mock("AddObject", path, interface, dbus.Dictionary(properties, signature="sv"),
+                   dbus.Array([], signature="(ssss)"))
+        added = object.__new__(MockService)
+        added.__dict__ = {**self.__dict__, "_path": path, "_interface": interface}
+        return added
+
+    def add_method(self, name, takes, answers, code):
+        self._mock("AddMethod", self._interface, name, takes, answers, code)
+
+    def was_asked(self, name):
+        """Whether that method was called."""
+        return len(self._mock("GetMethodCalls", name)) > 0
+
+    def update(self, interface, properties):
+        self._mock("UpdateProperties", interface, self._test.dbus.Dictionary(properties, signature="sv"))
+
+    def emit(self, signal_name, signature, *arguments):
+        self._mock("EmitSignal", self._interface, signal_name, signature,
+                   self._test.dbus.Array(arguments, signature="v"))
+
+
+def works(number, title, start=None, end=None):
+    """An alert for a line of the small schedule."""
+    return alert(selector(route=f"r{number}"), *([period(start, end)] if start or end else []), text(10, en=title))
+
+
+__all__ = ["CARD_WIDTH", "COMPACT_HEIGHT", "MockService", "NAME", "NOW", "PATIENCE", "PROPERTIES", "SERVICE", "WindowTest", "signal", "sys",
+           "works"]
