@@ -205,6 +205,175 @@ TEST(DirectionsPlan, SubMessagesMergeRecursively) {
     EXPECT_FALSE(b.transitPreferences()->hasAvoidBusRoutes());
 }
 
+/// Sets a scalar, takes its presence away and gives it back, and looks at it alone.
+template <class Message, class Value>
+void expectPresenceOfItsOwn(const char* name,
+                            Value (Message::*get)() const,
+                            void (Message::*set)(Value),
+                            bool (Message::*has)() const,
+                            void (Message::*setHas)(bool)) {
+    SCOPED_TRACE(name);
+    Message message;
+    EXPECT_FALSE((message.*has)());
+    (message.*set)(Value{1});
+    EXPECT_TRUE((message.*has)());
+    EXPECT_EQ((message.*get)(), Value{1});
+    EXPECT_EQ(message.dictionaryRepresentation()->count(), 1U);
+    EXPECT_TRUE(message.dictionaryRepresentation()->objectForKey(name));
+    (message.*setHas)(false);
+    EXPECT_FALSE((message.*has)());
+    EXPECT_TRUE(encoded(message).empty());
+    (message.*setHas)(true);
+    EXPECT_EQ((message.*get)(), Value{1}) << "the value stays";
+    EXPECT_EQ(message.dictionaryRepresentation()->count(), 1U);
+}
+
+TEST(DirectionsPlan, EveryScalarHasAPresenceOfItsOwn) {
+    using Plan = DirectionsPlan;
+    expectPresenceOfItsOwn<Plan>("departureTime",
+                                 &Plan::departureTime,
+                                 &Plan::setDepartureTime,
+                                 &Plan::hasDepartureTime,
+                                 &Plan::setHasDepartureTime);
+    expectPresenceOfItsOwn<Plan>("arrivalTime",
+                                 &Plan::arrivalTime,
+                                 &Plan::setArrivalTime,
+                                 &Plan::hasArrivalTime,
+                                 &Plan::setHasArrivalTime);
+    expectPresenceOfItsOwn<Plan>("currentRouteIndex",
+                                 &Plan::currentRouteIndex,
+                                 &Plan::setCurrentRouteIndex,
+                                 &Plan::hasCurrentRouteIndex,
+                                 &Plan::setHasCurrentRouteIndex);
+    expectPresenceOfItsOwn<Plan>("currentRouteStep",
+                                 &Plan::currentRouteStep,
+                                 &Plan::setCurrentRouteStep,
+                                 &Plan::hasCurrentRouteStep,
+                                 &Plan::setHasCurrentRouteStep);
+    expectPresenceOfItsOwn<Plan>("displayMethod",
+                                 &Plan::displayMethod,
+                                 &Plan::setDisplayMethod,
+                                 &Plan::hasDisplayMethod,
+                                 &Plan::setHasDisplayMethod);
+    expectPresenceOfItsOwn<Plan>("routesPerInitialPage",
+                                 &Plan::routesPerInitialPage,
+                                 &Plan::setRoutesPerInitialPage,
+                                 &Plan::hasRoutesPerInitialPage,
+                                 &Plan::setHasRoutesPerInitialPage);
+    expectPresenceOfItsOwn<Plan>("earlierPagesLoaded",
+                                 &Plan::earlierPagesLoaded,
+                                 &Plan::setEarlierPagesLoaded,
+                                 &Plan::hasEarlierPagesLoaded,
+                                 &Plan::setHasEarlierPagesLoaded);
+    expectPresenceOfItsOwn<Plan>("laterPagesLoaded",
+                                 &Plan::laterPagesLoaded,
+                                 &Plan::setLaterPagesLoaded,
+                                 &Plan::hasLaterPagesLoaded,
+                                 &Plan::setHasLaterPagesLoaded);
+    expectPresenceOfItsOwn<Plan>("routesPerEarlierPage",
+                                 &Plan::routesPerEarlierPage,
+                                 &Plan::setRoutesPerEarlierPage,
+                                 &Plan::hasRoutesPerEarlierPage,
+                                 &Plan::setHasRoutesPerEarlierPage);
+    expectPresenceOfItsOwn<Plan>("routesPerLaterPage",
+                                 &Plan::routesPerLaterPage,
+                                 &Plan::setRoutesPerLaterPage,
+                                 &Plan::hasRoutesPerLaterPage,
+                                 &Plan::setHasRoutesPerLaterPage);
+    expectPresenceOfItsOwn<Plan>("transitPrioritization",
+                                 &Plan::transitPrioritization,
+                                 &Plan::setTransitPrioritization,
+                                 &Plan::hasTransitPrioritization,
+                                 &Plan::setHasTransitPrioritization);
+    expectPresenceOfItsOwn<Plan>("transitSurchargeOption",
+                                 &Plan::transitSurchargeOption,
+                                 &Plan::setTransitSurchargeOption,
+                                 &Plan::hasTransitSurchargeOption,
+                                 &Plan::setHasTransitSurchargeOption);
+    expectPresenceOfItsOwn<Plan>("expiryTime",
+                                 &Plan::expiryTime,
+                                 &Plan::setExpiryTime,
+                                 &Plan::hasExpiryTime,
+                                 &Plan::setHasExpiryTime);
+    expectPresenceOfItsOwn<Plan>("isPlayingTrace",
+                                 &Plan::isPlayingTrace,
+                                 &Plan::setIsPlayingTrace,
+                                 &Plan::hasIsPlayingTrace,
+                                 &Plan::setHasIsPlayingTrace);
+    using Preferences = DirectionsPlanTransitPreferences;
+    expectPresenceOfItsOwn<Preferences>("avoidBusRoutes",
+                                        &Preferences::avoidBusRoutes,
+                                        &Preferences::setAvoidBusRoutes,
+                                        &Preferences::hasAvoidBusRoutes,
+                                        &Preferences::setHasAvoidBusRoutes);
+    expectPresenceOfItsOwn<Preferences>("avoidMetroLightRailRoutes",
+                                        &Preferences::avoidMetroLightRailRoutes,
+                                        &Preferences::setAvoidMetroLightRailRoutes,
+                                        &Preferences::hasAvoidMetroLightRailRoutes,
+                                        &Preferences::setHasAvoidMetroLightRailRoutes);
+    expectPresenceOfItsOwn<Preferences>("avoidRailRoutes",
+                                        &Preferences::avoidRailRoutes,
+                                        &Preferences::setAvoidRailRoutes,
+                                        &Preferences::hasAvoidRailRoutes,
+                                        &Preferences::setHasAvoidRailRoutes);
+    expectPresenceOfItsOwn<Preferences>("avoidFerryRoutes",
+                                        &Preferences::avoidFerryRoutes,
+                                        &Preferences::setAvoidFerryRoutes,
+                                        &Preferences::hasAvoidFerryRoutes,
+                                        &Preferences::setHasAvoidFerryRoutes);
+}
+
+TEST(DirectionsPlan, EveryFieldCountsInEquality) {
+    const auto differing = [](auto&& change) {
+        const auto plan = fullPlan();
+        change(*plan);
+        return !equal(fullPlan(), plan) && !equal(plan, fullPlan());
+    };
+    EXPECT_TRUE(differing([](auto& p) { p.routeRequestStorage()->setBytes({0x08, 0x02}); }));
+    EXPECT_TRUE(differing([](auto& p) { p.setOriginString(std::nullopt); }));
+    EXPECT_TRUE(differing([](auto& p) { p.setDestinationString("elsewhere"); }));
+    EXPECT_TRUE(differing([](auto& p) { p.setDepartureTime(4.5); }));
+    EXPECT_TRUE(differing([](auto& p) { p.setHasArrivalTime(false); }));
+    EXPECT_TRUE(differing([](auto& p) { p.setCurrentRouteIndex(0); }));
+    EXPECT_TRUE(differing([](auto& p) { p.setCurrentRouteStep(0); }));
+    EXPECT_TRUE(differing([](auto& p) { p.setDisplayMethod(0); }));
+    EXPECT_TRUE(differing([](auto& p) { p.transitPreferences()->setAvoidBusRoutes(false); }));
+    EXPECT_TRUE(differing([](auto& p) { p.transitPreferences()->setAvoidRailRoutes(false); }));
+    EXPECT_TRUE(differing([](auto& p) { p.setRoutesPerInitialPage(0); }));
+    EXPECT_TRUE(differing([](auto& p) { p.setEarlierPagesLoaded(0); }));
+    EXPECT_TRUE(differing([](auto& p) { p.setLaterPagesLoaded(0); }));
+    EXPECT_TRUE(differing([](auto& p) { p.setRoutesPerEarlierPage(0); }));
+    EXPECT_TRUE(differing([](auto& p) { p.setRoutesPerLaterPage(0); }));
+    EXPECT_TRUE(differing([](auto& p) { p.setTransitPrioritization(0); }));
+    EXPECT_TRUE(differing([](auto& p) { p.setTransitSurchargeOption(0); }));
+    EXPECT_TRUE(differing([](auto& p) { p.setExpiryTime(0); }));
+    EXPECT_TRUE(differing([](auto& p) { p.setIsPlayingTrace(false); }));
+    EXPECT_FALSE(differing([](auto&) {}));
+}
+
+TEST(DirectionsPlan, CopyIsDeepAndCopyToLeavesTheRest) {
+    const auto plan = fullPlan();
+    const auto copy = std::dynamic_pointer_cast<DirectionsPlan>(plan->copy());
+    ASSERT_TRUE(copy);
+    EXPECT_TRUE(equal(plan, copy));
+    copy->transitPreferences()->setAvoidBusRoutes(false);
+    copy->routeRequestStorage()->setBytes({});
+    EXPECT_TRUE(plan->transitPreferences()->avoidBusRoutes());
+    EXPECT_EQ(plan->routeRequestStorage()->bytes(), (Bytes{0x08, 0x01}));
+    DirectionsPlan source;
+    source.setExpiryTime(0);
+    source.copyTo(*copy);
+    EXPECT_EQ(copy->expiryTime(), 0);
+    EXPECT_EQ(copy->originString(), "here");
+    EXPECT_TRUE(copy->isPlayingTrace());
+}
+
+TEST(DirectionsPlan, DescriptionIsTheRootDescriptionAndTheDictionary) {
+    DirectionsPlan plan;
+    plan.setDisplayMethod(1);
+    EXPECT_EQ(plan.description(), plan.rootDescription() + " {displayMethod = RoutePicking}");
+}
+
 TEST(DirectionsPlan, HashIsTheExclusiveOrOfItsFields) {
     DirectionsPlan plan;
     EXPECT_EQ(plan.hash(), 0U);

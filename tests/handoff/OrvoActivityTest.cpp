@@ -108,6 +108,55 @@ TEST(OrvoActivity, SettingAScalarMakesItPresentAndClearingKeepsItsValue) {
     EXPECT_EQ(activity.selectedPlaceIndex(), 9U);
 }
 
+TEST(OrvoActivity, EveryScalarHasAPresenceOfItsOwn) {
+    const auto expect = [](const char* name, auto get, auto set, auto has, auto setHas) {
+        SCOPED_TRACE(name);
+        OrvoActivity activity;
+        EXPECT_FALSE((activity.*has)());
+        (activity.*set)(1);
+        EXPECT_TRUE((activity.*has)());
+        const auto dictionary = activity.dictionaryRepresentation();
+        EXPECT_EQ(dictionary->count(), 1U);
+        EXPECT_TRUE(dictionary->objectForKey(name));
+        (activity.*setHas)(false);
+        EXPECT_FALSE((activity.*has)());
+        EXPECT_TRUE(encoded(activity).empty());
+        (activity.*setHas)(true);
+        EXPECT_TRUE((activity.*get)() == 1) << "the value stays";
+        EXPECT_EQ(activity.dictionaryRepresentation()->count(), 1U);
+    };
+    expect("collectionsMode",
+           &OrvoActivity::collectionsMode,
+           &OrvoActivity::setCollectionsMode,
+           &OrvoActivity::hasCollectionsMode,
+           &OrvoActivity::setHasCollectionsMode);
+    expect("selectedPlaceIndex",
+           &OrvoActivity::selectedPlaceIndex,
+           &OrvoActivity::setSelectedPlaceIndex,
+           &OrvoActivity::hasSelectedPlaceIndex,
+           &OrvoActivity::setHasSelectedPlaceIndex);
+    expect("isPresentingSelectedPlace",
+           &OrvoActivity::isPresentingSelectedPlace,
+           &OrvoActivity::setIsPresentingSelectedPlace,
+           &OrvoActivity::hasIsPresentingSelectedPlace,
+           &OrvoActivity::setHasIsPresentingSelectedPlace);
+    expect("isDroppedPinSelected",
+           &OrvoActivity::isDroppedPinSelected,
+           &OrvoActivity::setIsDroppedPinSelected,
+           &OrvoActivity::hasIsDroppedPinSelected,
+           &OrvoActivity::setHasIsDroppedPinSelected);
+    expect("isDroppedPinPresented",
+           &OrvoActivity::isDroppedPinPresented,
+           &OrvoActivity::setIsDroppedPinPresented,
+           &OrvoActivity::hasIsDroppedPinPresented,
+           &OrvoActivity::setHasIsDroppedPinPresented);
+    expect("selectedTransitFeatureID",
+           &OrvoActivity::selectedTransitFeatureID,
+           &OrvoActivity::setSelectedTransitFeatureID,
+           &OrvoActivity::hasSelectedTransitFeatureID,
+           &OrvoActivity::setHasSelectedTransitFeatureID);
+}
+
 TEST(OrvoActivity, ObjectsArePresentWhenNotNil) {
     OrvoActivity activity;
     EXPECT_FALSE(activity.hasLineItem());
@@ -162,6 +211,15 @@ TEST(OrvoActivity, LineItemAndDisplayOptionsSerialiseToTwoFieldsFieldOneFirst) {
     EXPECT_EQ(tags,
               (std::vector<ProtoTag>{{1, ProtoWireType::LengthDelimited},
                                      {15, ProtoWireType::LengthDelimited}}));
+}
+
+TEST(OrvoActivity, PlacesAreAFieldEachInTheirOrder) {
+    EXPECT_EQ(activityWith([](auto& a) {
+                  a.addSearchPlaces(opaque<MapItemStorage>({7}));
+                  a.addSearchPlaces(opaque<MapItemStorage>({}));
+                  a.addSearchPlaces(opaque<MapItemStorage>({5}));
+              }),
+              (Bytes{0x22, 1, 7, 0x22, 0, 0x22, 1, 5}));
 }
 
 TEST(OrvoActivity, NegativeEnumerationIsTenBytes) {
