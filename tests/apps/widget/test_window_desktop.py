@@ -1,8 +1,9 @@
 """The widget's window on a desktop that locks, sleeps and becomes dark: services stand in for the desktop's own."""
 
+import time
 import unittest
 
-from window_support import COMPACT_HEIGHT, MockService, WindowTest, works
+from window_support import COMPACT_HEIGHT, PATIENCE, MockService, WindowTest, works
 
 LOGIN = "org.freedesktop.login1"
 MANAGER = (LOGIN, "/org/freedesktop/login1", f"{LOGIN}.Manager")
@@ -36,6 +37,25 @@ class Desktop(WindowTest):
         self.lock.update(f"{LOGIN}.Session", {"LockedHint": False})
         self.shows("Works on 2")
         self.is_asked(2)
+        self.close_widget()
+
+    def test_one_alarm_is_set_for_what_comes_next_and_none_while_it_is_locked(self):
+        now = int(time.time())
+        self.server.tell(works(1, "Works on 1", now - 60, now + 900))
+        self.open_widget()
+        self.shows("Works on 1")
+
+        def next_change():
+            alarms = self.alarms()
+            return len(alarms) == 1 and 900 - PATIENCE < alarms[0] <= 900
+        self.eventually(next_change, "the end of the incident is waited for")
+        self.lock.update(f"{LOGIN}.Session", {"LockedHint": True})
+        self.eventually(lambda: self.alarms() == [], "nothing is waited for")
+        self.lock.update(f"{LOGIN}.Session", {"LockedHint": False})
+        self.eventually(next_change, "the end of the incident is waited for again")
+        self.server.tell(works(1, "Works on 1"))
+        self.wake()
+        self.eventually(lambda: len(self.alarms()) == 1 and self.alarms()[0] > 1200, "the refresh is waited for")
         self.close_widget()
 
     def test_it_wakes_to_fresh_rows(self):

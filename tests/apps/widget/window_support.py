@@ -235,7 +235,7 @@ class WindowTest(BusTest, WidgetTest):
         while True:
             try:
                 seen = look()
-            except self.dbus.DBusException:
+            except (self.dbus.DBusException, FileNotFoundError):
                 seen = None  # it went while it was asked
             if seen:
                 return seen
@@ -287,6 +287,15 @@ class WindowTest(BusTest, WidgetTest):
             file.seek(start + 12 * colors + y * width + 4 * x)
             blue, green, red, _ = file.read(4)
         return f"#{red:02x}{green:02x}{blue:02x}"
+
+    def alarms(self):
+        """In how many seconds each of the kernel's timers that it has set goes off."""
+        process = pathlib.Path("/proc", str(self.process.pid))
+        timers = [file.name for file in (process / "fd").iterdir() if "timerfd" in os.readlink(file)]
+        told = [(process / "fdinfo" / name).read_text() for name in timers]
+        seconds = [int(text.split("it_value: (")[1].split(",")[0]) for text in told]
+        nothing = "it_value: (0, 0)"
+        return [second for second, text in zip(seconds, told) if nothing not in text]
 
     # What a person does
 
