@@ -44,7 +44,6 @@ protected:
     std::shared_ptr<Cell> show(const Row& row, double height = RowHeight) {
         auto cell = Cell::initWithStyle_reuseIdentifier(UITableViewCellStyle::Default, "row");
         cell->setIdentifier("cell");
-        cell->contentView()->setIdentifier("contentView");
         cell->setTransitItem(item(row));
         cell->setTrailingArtworkColumnWidth(ColumnWidth);
         cell->setRowHeight(height);

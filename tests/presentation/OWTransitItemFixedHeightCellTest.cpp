@@ -26,7 +26,6 @@ public:
     }
     void _createSubviews() override {
         steps.push_back(contentView() ? "create after super" : "create");
-        contentView()->setIdentifier("contentView");
         Cell::_createSubviews();
         steps.push_back("created");
     }

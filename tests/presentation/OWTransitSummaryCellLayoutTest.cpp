@@ -123,7 +123,7 @@ cell 0 0 280 110
       vibrancyViewForPrimaryLabel 0 26 280 17
         UIView2 0 26 280 17
           primaryLabel 0 26 280 17 "12 advisories"
-      artworksLabel 0 55 280 28
+      artworksLabel 0 55 280 28 [U0] [U1] [U2] [U3] [U4] "+4"
 )");
     EXPECT_EQ(layout(show("12 advisories", 9), 359, RowHeight), R"(
 cell 0 0 359 110
@@ -133,7 +133,7 @@ cell 0 0 359 110
       vibrancyViewForPrimaryLabel 0 26 359 17
         UIView2 0 26 359 17
           primaryLabel 0 26 359 17 "12 advisories"
-      artworksLabel 0 55 359 28
+      artworksLabel 0 55 359 28 [U0] [U1] [U2] [U3] [U4] [U5] [U6] "+2"
 )");
     EXPECT_EQ(layout(show("12 advisories", 9), 500, RowHeight), R"(
 cell 0 0 500 110
@@ -143,7 +143,7 @@ cell 0 0 500 110
       vibrancyViewForPrimaryLabel 0 26 500 17
         UIView2 0 26 500 17
           primaryLabel 0 26 500 17 "12 advisories"
-      artworksLabel 0 55 500 28
+      artworksLabel 0 55 500 28 [U0] [U1] [U2] [U3] [U4] [U5] [U6] [U7] [U8]
 )");
 }
 
@@ -157,7 +157,7 @@ cell 0 0 327 91
       vibrancyViewForPrimaryLabel 0 17 327 14
         UIView2 0 17 327 14
           primaryLabel 0 17 327 14 "12 advisories"
-      artworksLabel 0 45 327 28
+      artworksLabel 0 45 327 28 [U0] [U1] [U2] [U3] [U4] [U5] "+3"
 )");
     useSize(UIContentSizeCategory::AX5);
     EXPECT_EQ(layout(show("12 advisories", 9, 343), 327, 343), R"(
@@ -168,7 +168,7 @@ cell 0 0 327 343
       vibrancyViewForPrimaryLabel 0 128 327 53
         UIView2 0 128 327 53
           primaryLabel 0 128 327 53 "12 advisori…"
-      artworksLabel 0 182 327 28
+      artworksLabel 0 182 327 28 [U0] [U1] [U2] [U3] [U4] [U5] "+3"
 )");
 }
 

@@ -22,7 +22,6 @@ public:
     }
     void _createSubviews() override {
         steps.push_back(contentView() ? "create after super" : "create");
-        contentView()->setIdentifier("contentView");
         OWTransitSummaryCell::_createSubviews();
         for (const auto& constraint : initial)
             if (!constraint->isActive())

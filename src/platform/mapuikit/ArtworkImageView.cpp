@@ -46,6 +46,10 @@ void ArtworkImageView::drawRect(Canvas& canvas) {
         UIImageDrawing::draw(canvas, *image, bounds(), *this);
 }
 
+std::string ArtworkImageView::_dumpedContent() const {
+    return _imageSource ? _imageSource->_dumpedName() : "";
+}
+
 void ArtworkImageView::traitCollectionDidChange(const UITraitCollection& previous) {
     UIView::traitCollectionDidChange(previous);
     // A picture's edges lie on device pixels, so its size in points is not the same at each scale.

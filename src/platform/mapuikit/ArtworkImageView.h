@@ -27,6 +27,7 @@ public:
     [[nodiscard]] CGSize intrinsicContentSize() const override;
     void drawRect(Canvas& canvas) override;
     void traitCollectionDidChange(const UITraitCollection& previous) override;
+    [[nodiscard]] std::string _dumpedContent() const override;
     [[nodiscard]] std::string className() const override { return "ArtworkImageView"; }
 
 private:

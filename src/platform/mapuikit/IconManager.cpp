@@ -16,6 +16,12 @@ IconManager::shieldOfArtwork(const TransitArtworkDataSource& artwork) {
     return TransitShieldDataSource::initWithFields({.shieldText = text->alternativeString()});
 }
 
+std::string IconManager::_nameOfArtwork(const TransitArtworkDataSource& artwork) {
+    const auto shield = shieldOfArtwork(artwork);
+    const auto text = shield ? shield->shieldText().value_or("") : std::string();
+    return text.empty() ? text : "[" + text + "]";
+}
+
 std::shared_ptr<IconManager> IconManager::sharedManager() {
     return manager().get();
 }

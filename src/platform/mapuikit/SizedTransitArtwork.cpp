@@ -1,6 +1,7 @@
 #include "platform/mapuikit/SizedTransitArtwork.h"
 
 #include "platform/foundation/Hashing.h"
+#include "platform/mapuikit/IconManager.h"
 
 namespace orvo {
 
@@ -21,6 +22,10 @@ SizedTransitArtwork::imageToDisplayWithScreenScale_nightMode(double scale, bool 
         return nullptr;
     return _artworkCache->imageForArtwork_shieldSize_scale_nightMode(
         _artwork, _shieldSize, scale, nightMode);
+}
+
+std::string SizedTransitArtwork::_dumpedName() const {
+    return _artwork ? IconManager::_nameOfArtwork(*_artwork) : "";
 }
 
 bool SizedTransitArtwork::isEqual(const NSObject* other) const {

@@ -29,6 +29,8 @@ public:
     [[nodiscard]] std::shared_ptr<UIImage>
     imageToDisplayWithScreenScale_nightMode(double scale, bool nightMode) override;
 
+    [[nodiscard]] std::string _dumpedName() const override;
+
     /// The artwork by transit artwork equality, the size, and the same cache object.
     [[nodiscard]] bool isEqual(const NSObject* other) const override;
     [[nodiscard]] std::uint64_t hash() const override;

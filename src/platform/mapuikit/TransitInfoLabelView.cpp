@@ -1,6 +1,7 @@
 #include "platform/mapuikit/TransitInfoLabelView.h"
 
 #include "platform/geoservices/TransitArtworkTypes.h"
+#include "platform/mapuikit/IconManager.h"
 #include "platform/mapuikit/ShieldPainter.h"
 #include "platform/uikit/UIColor.h"
 #include "platform/uikit/UIFont.h"
@@ -261,6 +262,18 @@ void TransitInfoLabelView::drawText(Canvas& canvas, const CGRect& place) const {
     canvas.text(lines.front(),
                 {place.origin.x, place.origin.y + baselineInLine()},
                 color->resolvedColorWithTraitCollection(traitCollection()));
+}
+
+std::string TransitInfoLabelView::_dumpedContent() const {
+    std::string content;
+    const auto add = [&content](const std::string& part) {
+        content += (content.empty() || part.empty() ? "" : " ") + part;
+    };
+    for (std::size_t i = 0; i < _shownShields(); ++i)
+        add(IconManager::_nameOfArtwork(*_artworks[i]));
+    if (const auto text = _truncationText())
+        add("\"" + *text + "\"");
+    return content;
 }
 
 std::optional<std::string> TransitInfoLabelView::accessibilityLabel() const {

@@ -78,6 +78,8 @@ public:
     void traitCollectionDidChange(const UITraitCollection& previous) override;
     /// Where none was set: what is spoken for the shields that are shown, and the text.
     [[nodiscard]] std::optional<std::string> accessibilityLabel() const override;
+    /// The shields that are shown, then the text for the others.
+    [[nodiscard]] std::string _dumpedContent() const override;
     [[nodiscard]] std::string className() const override { return "TransitInfoLabelView"; }
 
 private:

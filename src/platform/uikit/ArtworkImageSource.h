@@ -2,6 +2,8 @@
 
 #include "platform/foundation/NSObject.h"
 
+#include <string>
+
 namespace orvo {
 
 class UIImage;
@@ -13,6 +15,8 @@ public:
     /// nothing to show.
     [[nodiscard]] virtual std::shared_ptr<UIImage>
     imageToDisplayWithScreenScale_nightMode(double scale, bool nightMode) = 0;
+    /// What it is, as the dump of a view tree says it. Empty where it has no name.
+    [[nodiscard]] virtual std::string _dumpedName() const { return {}; }
 };
 
 } // namespace orvo

@@ -10,7 +10,18 @@ namespace orvo {
 
 namespace {
 
-constexpr std::array FixedImages{"good-v2", "good-alt-v2", "advisories-v2", "WidgetGenericTransit"};
+struct FixedImage {
+    const char* name;
+    UIEdgeInsets empty;
+};
+
+constexpr UIEdgeInsets AroundDisc{2, 2, 2, 2};
+constexpr std::array FixedImages{
+    FixedImage{"good-v2", AroundDisc},
+    FixedImage{"good-alt-v2", AroundDisc},
+    FixedImage{"advisories-v2", {3, 2, 3, 2}},
+    FixedImage{"WidgetGenericTransit", {1, 5, 1, 5}},
+};
 constexpr CGSize FixedImageSize{24, 24};
 
 } // namespace
@@ -18,11 +29,12 @@ constexpr CGSize FixedImageSize{24, 24};
 std::shared_ptr<UIImage> UIImage::imageNamed(const std::string& name) {
     static const auto images = [] {
         std::map<std::string, std::shared_ptr<UIImage>> made;
-        for (const char* fixed : FixedImages) {
+        for (const auto& fixed : FixedImages) {
             auto image = std::make_shared<UIImage>();
-            image->_name = fixed;
+            image->_name = fixed.name;
             image->_size = FixedImageSize;
-            made.emplace(fixed, std::move(image));
+            image->_alignmentRectInsets = fixed.empty;
+            made.emplace(fixed.name, std::move(image));
         }
         return made;
     }();

@@ -2,6 +2,7 @@
 
 #include "platform/foundation/CGGeometry.h"
 #include "platform/uikit/ArtworkImageSource.h"
+#include "platform/uikit/UIGeometry.h"
 
 #include <cstdint>
 #include <optional>
@@ -29,6 +30,11 @@ public:
     [[nodiscard]] const std::optional<std::string>& name() const noexcept { return _name; }
     /// In points.
     [[nodiscard]] CGSize size() const noexcept { return _size; }
+    /// What is empty around a fixed image's drawing, in points of its size: who lines it up with a
+    /// text goes by what one sees. None for an image of pixels.
+    [[nodiscard]] const UIEdgeInsets& alignmentRectInsets() const noexcept {
+        return _alignmentRectInsets;
+    }
     /// Pixels a point; 1 for a fixed image.
     [[nodiscard]] double scale() const noexcept { return _scale; }
     /// Empty for a fixed image.
@@ -37,11 +43,13 @@ public:
     /// Itself: a fixed image is drawn for whatever screen shows it.
     [[nodiscard]] std::shared_ptr<UIImage>
     imageToDisplayWithScreenScale_nightMode(double scale, bool nightMode) override;
+    [[nodiscard]] std::string _dumpedName() const override { return _name.value_or(""); }
     [[nodiscard]] std::string description() const override;
 
 private:
     std::optional<std::string> _name;
     CGSize _size;
+    UIEdgeInsets _alignmentRectInsets;
     double _scale = 1;
     std::vector<std::uint32_t> _pixels;
 };

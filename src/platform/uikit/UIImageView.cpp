@@ -37,4 +37,8 @@ void UIImageView::drawRect(Canvas& canvas) {
         UIImageDrawing::draw(canvas, *_image, bounds(), *this);
 }
 
+std::string UIImageView::_dumpedContent() const {
+    return _image ? _image->_dumpedName() : "";
+}
+
 } // namespace orvo

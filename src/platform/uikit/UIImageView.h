@@ -21,6 +21,7 @@ public:
     /// The size of the image; none without an image.
     [[nodiscard]] CGSize intrinsicContentSize() const override;
     void drawRect(Canvas& canvas) override;
+    [[nodiscard]] std::string _dumpedContent() const override;
     [[nodiscard]] std::string className() const override { return "UIImageView"; }
 
 private:

@@ -256,6 +256,13 @@ const TextLines& UILabel::_visibleLines() const {
     return *_visible;
 }
 
+std::string UILabel::_dumpedContent() const {
+    std::string text;
+    for (const auto& line : _visibleLines().lines)
+        text += (text.empty() ? "\"" : " \"") + line.text + "\"";
+    return text;
+}
+
 // Drawing
 
 void UILabel::drawRect(Canvas& canvas) {

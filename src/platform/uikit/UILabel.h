@@ -66,6 +66,7 @@ public:
     void traitCollectionDidChange(const UITraitCollection& previous) override;
     /// Its text where none was set.
     [[nodiscard]] std::optional<std::string> accessibilityLabel() const override;
+    [[nodiscard]] std::string _dumpedContent() const override;
     [[nodiscard]] std::string className() const override { return "UILabel"; }
 
 protected:

@@ -211,6 +211,10 @@ public:
     /// vibrancy effect above; nil outside any.
     [[nodiscard]] virtual std::shared_ptr<UIColor> _vibrantColor() const;
 
+    /// What it shows by itself, as the dump of a view tree says it: texts in quotes, shields in
+    /// brackets, images by their names. Empty for nothing.
+    [[nodiscard]] virtual std::string _dumpedContent() const { return {}; }
+
     // Accessibility
     [[nodiscard]] bool isAccessibilityElement() const noexcept { return _accessible; }
     void setIsAccessibilityElement(bool element) noexcept { _accessible = element; }

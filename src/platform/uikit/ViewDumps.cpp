@@ -1,6 +1,5 @@
 #include "platform/uikit/ViewDumps.h"
 
-#include "platform/uikit/UILabel.h"
 #include "platform/uikit/_LayoutEngine.h"
 
 #include <cstdio>
@@ -60,10 +59,8 @@ void dump(const UIView& view,
         into += " hidden";
     if (view.alpha() != 1)
         into += " alpha " + number(view.alpha());
-    if (const auto* label = dynamic_cast<const UILabel*>(&view)) {
-        for (const auto& line : label->_visibleLines().lines)
-            into += " \"" + line.text + "\"";
-    }
+    if (const auto shown = view._dumpedContent(); !shown.empty())
+        into += " " + shown;
     into += "\n";
     for (const auto& guide : view.layoutGuides()) {
         auto frame = guide->layoutFrame();

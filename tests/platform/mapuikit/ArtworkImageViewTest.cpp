@@ -33,6 +33,20 @@ TEST_F(ArtworkImageViewTest, IsAsLargeAsItsArtwork) {
     EXPECT_EQ(view->frame().size, (CGSize{20, 14}));
 }
 
+TEST_F(ArtworkImageViewTest, DumpsNameWhatItShows) {
+    const auto dumped = [this](const std::shared_ptr<ArtworkImageSource>& source) {
+        view->setImageSource(source);
+        card->layoutIfNeeded();
+        const auto tree = dumpViews(*card);
+        return tree.substr(tree.find("artwork"));
+    };
+    EXPECT_EQ(dumped(artwork("12")), "artwork 10 10 30 20 [12]\n");
+    EXPECT_EQ(dumped(UIImage::imageNamed("good-v2")), "artwork 10 10 24 24 good-v2\n");
+    EXPECT_EQ(
+        dumped(SizedTransitArtwork::initWithArtwork_shieldSize_artworkCache(nullptr, 3, nullptr)),
+        "artwork 10 10 0 0\n");
+}
+
 TEST_F(ArtworkImageViewTest, WithoutASourceShowsNothing) {
     EXPECT_EQ(view->intrinsicContentSize(),
               (CGSize{UIViewNoIntrinsicMetric, UIViewNoIntrinsicMetric}));

@@ -64,6 +64,16 @@ TEST_F(TransitInfoLabelViewTest, ShieldsStandInOrderAsFarApartAsWasSaid) {
                        "pixels 20x28 at 60 0 20 28"}));
 }
 
+TEST_F(TransitInfoLabelViewTest, DumpsNameTheShieldsAndTheTextForTheRest) {
+    EXPECT_EQ(dumpViews(*card), "UIView1 0 0 300 100\n  row 0 0 0 0\n");
+    view->setLabelItems(lines({"1", "22", "3"}));
+    card->layoutIfNeeded();
+    EXPECT_EQ(dumpViews(*card), "UIView1 0 0 300 100\n  row 0 0 80 28 [1] [22] [3]\n");
+    cutTo(70);
+    card->layoutIfNeeded();
+    EXPECT_EQ(dumpViews(*card), "UIView1 0 0 300 100\n  row 0 0 70 28 [1] [22] \"+1\"\n");
+}
+
 TEST_F(TransitInfoLabelViewTest, IconsHaveASizeOfTheirOwn) {
     const auto row =
         TransitInfoLabelView::initWithLabelItems_iconSize_shieldSize_spaceBetweenShields_maxWidth(

@@ -46,6 +46,7 @@ bool UITableViewCell::_initWithStyle_reuseIdentifier(UITableViewCellStyle style,
     _style = style;
     _reuseIdentifier = std::move(reuseIdentifier);
     _contentView = UIView::init();
+    _contentView->setIdentifier("contentView");
     _contentView->_setFillsSuperview(true);
     addSubview(_contentView);
     setIsAccessibilityElement(true);

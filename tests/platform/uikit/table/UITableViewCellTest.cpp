@@ -19,6 +19,10 @@ TEST_F(TableCellTest, ContentFillsTheCell) {
     EXPECT_EQ(row->separatorStyleOverride(), std::nullopt);
 }
 
+TEST_F(TableCellTest, ContentIsNamedInDumps) {
+    EXPECT_EQ(dumpViews(*cell()), "UITableViewCell1 0 0 0 0\n  contentView 0 0 0 0\n");
+}
+
 TEST_F(TableCellTest, HeightThatTheContentSaysWinsWithoutAConflict) {
     const auto row = cell();
     row->setFrame({{0, 0}, {100, 5}});
