@@ -12,12 +12,22 @@ namespace orvo {
 
 namespace {
 
+// A mark that is dimmed to 0.3 keeps a contrast of 3 to the card in each look.
+constexpr double VibrantFading = 0.3;
+
+/// How much of a view is seen. Vibrancy dims by its colour; what fades in it besides fades slowly,
+/// so that it can still be told from the card.
+double shownAlpha(const UIView& view) {
+    const double alpha = std::min<double>(view.alpha(), 1);
+    return view._vibrantColor() ? std::pow(alpha, VibrantFading) : alpha;
+}
+
 void drawView(UIView& view, Canvas& canvas) {
     if (view.isHidden() || view.alpha() <= 0)
         return;
     canvas.save();
     if (view.alpha() < 1)
-        canvas.fade(view.alpha());
+        canvas.fade(shownAlpha(view));
     const auto bounds = view.bounds();
     const CGRect area{{0, 0}, bounds.size};
     if (const auto& background = view.backgroundColor())

@@ -10,7 +10,8 @@ class UIImage;
 class UIView;
 
 /// Draws the view and what it holds, hidden ones left out, from its own origin, and marks all as
-/// displayed. Lays nothing out. Main thread.
+/// displayed. What is faded inside a vibrancy effect is drawn stronger than its alpha, so that it
+/// stays legible. Lays nothing out. Main thread.
 void drawViewHierarchy(UIView& root, Canvas& canvas);
 
 /// Lays the root out and draws it at its size, `scale` pixels a point, on nothing. The root's

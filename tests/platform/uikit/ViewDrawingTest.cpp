@@ -7,6 +7,10 @@
 #include "platform/uikit/UIImageView.h"
 #include "platform/uikit/UIVisualEffectView.h"
 #include "platform/uikit/drawing/Canvas.h"
+#include "platform/uikit/drawing/FixedImagePainter.h"
+
+#include <algorithm>
+#include <cmath>
 
 namespace orvo {
 namespace {
@@ -150,6 +154,61 @@ TEST_F(DrawingTest, VibrancyGivesTextsAndImagesItsColour) {
                      "pixels 2x2 5B5B63 at 50 0 1 1"}));
 }
 
+/// Relative luminance of a colour over a ground, as it is defined for contrast.
+double luminance(RGBA color, RGBA ground, double alpha) {
+    const auto linear = [alpha](int over, int under) {
+        const double part = (under + (over - under) * alpha) / 255;
+        return part <= 0.04045 ? part / 12.92 : std::pow((part + 0.055) / 1.055, 2.4);
+    };
+    return 0.2126 * linear(color.red, ground.red) + 0.7152 * linear(color.green, ground.green) +
+           0.0722 * linear(color.blue, ground.blue);
+}
+
+TEST_F(DrawingTest, ADimmedMarkCanBeToldFromTheCardInEveryLook) {
+    const auto effect =
+        UIVisualEffectView::initWithEffect(UIVibrancyEffect::widgetEffectForVibrancyStyle(102));
+    effect->setFrame({{0, 0}, {24, 24}});
+    const auto mark = constrained(
+        UIImageView::initWithImage(UIImage::imageNamed("good-alt-v2")), effect->contentView(), "m");
+    pin(mark, effect);
+    mark->setAlpha(0.3F);
+    const double shown = std::stod(draw(effect).front().substr(std::string("fade ").size()));
+    EXPECT_LT(shown, 0.8) << "it is dimmed still";
+    for (const auto style : {UIUserInterfaceStyle::Light, UIUserInterfaceStyle::Dark})
+        for (const auto contrast :
+             {UIAccessibilityContrast::Normal, UIAccessibilityContrast::High}) {
+            const UITraitCollection traits{.userInterfaceStyle = style,
+                                           .accessibilityContrast = contrast};
+            const auto ink =
+                UIColor::secondaryLabelColor()->resolvedColorWithTraitCollection(traits);
+            const auto card = UIColor::cardColor()->resolvedColorWithTraitCollection(traits);
+            const auto [darker, lighter] =
+                std::minmax({luminance(ink, card, shown), luminance(ink, card, 0)});
+            EXPECT_GE((lighter + 0.05) / (darker + 0.05), 3);
+        }
+}
+
+TEST_F(DrawingTest, VibrancyFadesToNothingAndFromTheWhole) {
+    const auto effect =
+        UIVisualEffectView::initWithEffect(UIVibrancyEffect::widgetEffectForVibrancyStyle(102));
+    effect->setFrame({{0, 0}, {100, 24}});
+    const auto text = label(effect->contentView(), "text", "a");
+    place(text, 0, 0);
+    const auto faded = [&](double alpha) {
+        text->setAlpha(alpha);
+        return draw(effect);
+    };
+    EXPECT_EQ(faded(0), Lines());
+    EXPECT_EQ(faded(1), Lines{"text a 5B5B63 at 0 8 5 0"});
+    double last = 0;
+    for (const double alpha : {0.01, 0.2, 0.5, 0.9}) {
+        const double shown = std::stod(faded(alpha).front().substr(std::string("fade ").size()));
+        EXPECT_GT(shown, last);
+        EXPECT_LT(shown, 1);
+        last = shown;
+    }
+}
+
 TEST_F(DrawingTest, OutsideVibrancyImagesHaveTheirOwnColourOrTheTint) {
     const auto drawn = [](const char* name) {
         const auto view = UIImageView::initWithImage(UIImage::imageNamed(name));
@@ -159,6 +218,33 @@ TEST_F(DrawingTest, OutsideVibrancyImagesHaveTheirOwnColourOrTheTint) {
     };
     EXPECT_EQ(drawn("good-v2"), "image good-v2 1B7F3B at 0 0 24 24");
     EXPECT_EQ(drawn("advisories-v2"), "image advisories-v2 A34A00 at 0 0 24 24");
+}
+
+TEST_F(DrawingTest, AFixedImageSaysWhatIsEmptyAroundIt) {
+    constexpr int Side = 240;
+    for (const char* name : {"good-v2", "good-alt-v2", "advisories-v2", "WidgetGenericTransit"}) {
+        const auto pixels = FixedImagePainter::draw(name, Side, RGBA::fromHex(0x000000));
+        CGFloat left = Side;
+        CGFloat top = Side;
+        CGFloat right = Side;
+        CGFloat bottom = Side;
+        for (int row = 0; row < Side; ++row)
+            for (int column = 0; column < Side; ++column)
+                if (pixels[static_cast<std::size_t>(row * Side + column)] != 0) {
+                    left = std::min<CGFloat>(left, column);
+                    top = std::min<CGFloat>(top, row);
+                    right = std::min<CGFloat>(right, Side - 1 - column);
+                    bottom = std::min<CGFloat>(bottom, Side - 1 - row);
+                }
+        const auto& said = UIImage::imageNamed(name)->alignmentRectInsets();
+        constexpr double ATenth = 0.15;
+        EXPECT_NEAR(said.left, left / 10, ATenth) << name;
+        EXPECT_NEAR(said.top, top / 10, ATenth) << name;
+        EXPECT_NEAR(said.right, right / 10, ATenth) << name;
+        EXPECT_NEAR(said.bottom, bottom / 10, ATenth) << name;
+    }
+    EXPECT_EQ(UIImage::imageWithPixels_size_scale({1}, {1, 1}, 1)->alignmentRectInsets(),
+              UIEdgeInsets());
 }
 
 TEST_F(DrawingTest, ImagesShrinkIntoTheirViewButNeverGrow) {
