@@ -160,7 +160,7 @@ bool OWTransitIncidentDataSource::_sanatizedExpandedValue_forListItem(
     bool expanded, const std::shared_ptr<OWTransitListItem>& listItem) {
     if (!expanded)
         return false;
-    if (listItem->expandedItems() && listItem->expandedItems()->count() > 0)
+    if (listItem && listItem->expandedItems() && listItem->expandedItems()->count() > 0)
         return true;
     widgetLog()->error(
         "Trying to set expanded state on widget datasource without expanded items to show, "
@@ -217,7 +217,7 @@ OWTransitIncidentDataSource::_itemAtIndexPath(const std::shared_ptr<NSIndexPath>
     if (!_expanded)
         return _shieldAjustedSummaryItem;
     const auto row = static_cast<std::size_t>(indexPath->row());
-    return row < _shieldAdjustedExpandedItems->count()
+    return _shieldAdjustedExpandedItems && row < _shieldAdjustedExpandedItems->count()
                ? _shieldAdjustedExpandedItems->objectAtIndex(row)
                : nullptr;
 }

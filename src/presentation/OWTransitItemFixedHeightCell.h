@@ -36,13 +36,13 @@ public:
         return _transitItem;
     }
     /// An equal item does nothing. An item without artwork, or nil, shows no shield.
-    void setTransitItem(const std::shared_ptr<OWTransitItem>& item);
+    virtual void setTransitItem(const std::shared_ptr<OWTransitItem>& item);
     /// In points; 110 until set.
     [[nodiscard]] double rowHeight() const;
-    void setRowHeight(double height);
+    virtual void setRowHeight(double height);
     /// In points; 0 until set.
     [[nodiscard]] double trailingArtworkColumnWidth() const;
-    void setTrailingArtworkColumnWidth(double width);
+    virtual void setTrailingArtworkColumnWidth(double width);
 
     /// Of the title, in the content size category of the moment.
     [[nodiscard]] virtual std::shared_ptr<UIFont> _primaryFont() const;

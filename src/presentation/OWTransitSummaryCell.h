@@ -37,13 +37,13 @@ public:
         return _item;
     }
     /// An equal item does nothing. Nil empties the row.
-    void setItem(const std::shared_ptr<OWTransitSummaryItem>& item);
+    virtual void setItem(const std::shared_ptr<OWTransitSummaryItem>& item);
     /// In points; 110 until set.
     [[nodiscard]] double rowHeight() const;
-    void setRowHeight(double height);
+    virtual void setRowHeight(double height);
     /// Of the row of shields, which alone keeps it.
     [[nodiscard]] std::shared_ptr<ArtworkDataSourceCache> artworkCache() const;
-    void setArtworkCache(const std::shared_ptr<ArtworkDataSourceCache>& cache);
+    virtual void setArtworkCache(const std::shared_ptr<ArtworkDataSourceCache>& cache);
 
     /// Always nil: nothing makes it, since the stack view keeps the shields at their distance.
     [[nodiscard]] const std::shared_ptr<NSLayoutConstraint>&

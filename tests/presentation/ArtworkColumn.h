@@ -2,8 +2,10 @@
 
 #include "platform/mapuikit/SizedTransitArtwork.h"
 
+#include <algorithm>
 #include <map>
 #include <memory>
+#include <set>
 #include <string>
 #include <utility>
 #include <vector>
@@ -17,13 +19,17 @@ public:
     std::shared_ptr<UIImage> imageForArtwork_shieldSize_scale_nightMode(
         const std::shared_ptr<TransitArtworkDataSource>& artwork,
         std::int64_t shieldSize,
-        double,
+        double scale,
         bool nightMode) override {
         if (!artwork)
             return nullptr;
         ++images;
-        askedForNight = askedForNight || nightMode;
+        scales.insert(scale);
         const auto text = artwork->shieldDataSource()->shieldText().value_or("");
+        if (const auto form = text + std::to_string(shieldSize);
+            std::ranges::find(forms, form) == forms.end())
+            forms.push_back(form);
+        askedForNight = askedForNight || nightMode;
         const auto said = widths.find({text, shieldSize});
         const double width =
             said == widths.end() ? 10.0 * static_cast<double>(shieldSize) : said->second;
@@ -34,6 +40,8 @@ public:
 
     std::map<std::pair<std::string, std::int64_t>, double> widths;
     int images = 0;
+    std::vector<std::string> forms; ///< text and size of what was asked for, in order, once each
+    std::set<double> scales;        ///< of the screens that they were asked for
     bool askedForNight = false;
 };
 

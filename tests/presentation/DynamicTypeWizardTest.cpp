@@ -60,7 +60,7 @@ public:
         : _mark(std::move(mark))
         , _performed(performed) {}
     Method methodForSelector(const Selector& selector) override {
-        if (!selector.name().starts_with("do"))
+        if (isDeaf || !selector.name().starts_with("do"))
             return NSObject::methodForSelector(selector);
         return [this, name = selector.name()](const auto&) -> std::shared_ptr<NSObject> {
             _performed.push_back(_mark + name);
@@ -70,6 +70,7 @@ public:
         };
     }
     std::function<void()> whenPerforming;
+    bool isDeaf = false;
 
 private:
     std::string _mark;
@@ -246,6 +247,8 @@ TEST_F(DynamicTypeWizardTest, OnlyARegisteredConstraintIsUpdated) {
     useSize(UIContentSizeCategory::AX5);
     changeSize();
     EXPECT_EQ(registered->constant(), 30);
+    Wizard::updateUnscaledConstantValue_fontProvider_forConstraint(31.2, nullptr, registered);
+    EXPECT_EQ(registered->constant(), 31) << "without a provider as it is, in whole pixels";
     const auto other = heightOf(view);
     Wizard::updateUnscaledConstantValue_fontProvider_forConstraint(30, headline, other);
     EXPECT_EQ(other->constant(), 1);
@@ -281,6 +284,16 @@ TEST_F(DynamicTypeWizardTest, AnObjectThatDoesNotRespondIsNotRegistered) {
                   Wizard::_singletonInstance()->objectToSelectorStringMaps()->objectForKey(
                       *NSNumber::numberWithInteger(1)))),
               before);
+}
+
+TEST_F(DynamicTypeWizardTest, AnObjectThatRespondsNoMoreIsSkipped) {
+    const auto object = performer();
+    const auto other = performer("other ");
+    perform(object, "doIt", 1);
+    perform(other, "doIt", 1);
+    object->isDeaf = true;
+    changeSize();
+    EXPECT_EQ(performed, Names{"other doIt"});
 }
 
 TEST_F(DynamicTypeWizardTest, ALaterSelectorOfAPhaseReplacesTheEarlier) {

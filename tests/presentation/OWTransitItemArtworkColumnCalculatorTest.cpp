@@ -145,6 +145,28 @@ TEST_F(OWTransitItemArtworkColumnCalculatorTest, TheParameterIsComparedAsItWasGi
     EXPECT_EQ(calls({50, 50, {1, 0, 0, 0}}), 1);
 }
 
+TEST_F(OWTransitItemArtworkColumnCalculatorTest, EachNumberOfTheParameterCounts) {
+    const auto items = NSArray::arrayOf({item("a", shield("a"))});
+    const ArtworkWidthCalculatorSizeParameter usual{5, 60, {1, 2, 3, 4}};
+    const auto looks = [&](const ArtworkWidthCalculatorSizeParameter& parameter) {
+        const int before = cache->images;
+        (void)calculator->itemsFromItems_sizeParameter_outArtworkColumnWidth_downSizingBlock(
+            items, parameter, nullptr, nullptr);
+        return cache->images > before;
+    };
+    using Parameter = ArtworkWidthCalculatorSizeParameter;
+    for (const auto& other : {Parameter{5.5, 60, {1, 2, 3, 4}},
+                              Parameter{5, 60.5, {1, 2, 3, 4}},
+                              Parameter{5, 60, {1.5, 2, 3, 4}},
+                              Parameter{5, 60, {1, 2.5, 3, 4}},
+                              Parameter{5, 60, {1, 2, 3.5, 4}},
+                              Parameter{5, 60, {1, 2, 3, 4.5}}}) {
+        EXPECT_TRUE(looks(usual));
+        EXPECT_FALSE(looks(usual));
+        EXPECT_TRUE(looks(other));
+    }
+}
+
 TEST_F(OWTransitItemArtworkColumnCalculatorTest, AFreshCalculatorAlwaysCalculates) {
     width = -1;
     const auto items = NSArray::array();

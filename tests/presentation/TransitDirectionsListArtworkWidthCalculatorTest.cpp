@@ -1,10 +1,14 @@
 #include "presentation/TransitDirectionsListArtworkWidthCalculator.h"
 
+#include "platform/uikit/UITraitCollection.h"
 #include "presentation/ArtworkColumn.h"
 
 #include <gtest/gtest.h>
 
 #include <initializer_list>
+#include <set>
+#include <string>
+#include <vector>
 
 namespace orvo {
 namespace {
@@ -42,6 +46,12 @@ protected:
         const auto form =
             std::dynamic_pointer_cast<SizedTransitArtwork>(replacements->objectForKey(initial));
         return form ? form->shieldSize() : -1;
+    }
+    /// The smaller forms in the order in which they were tried.
+    std::vector<std::string> shrinking() const {
+        auto forms = cache->forms;
+        std::erase_if(forms, [](const std::string& form) { return form.ends_with('7'); });
+        return forms;
     }
     static ArtworkWidthCalculatorSizeParameter normalised(double least, double most) {
         return Calculator::initWithSizedArtworks_sizeParameter(NSArray::array(),
@@ -87,6 +97,30 @@ TEST_F(TransitDirectionsListArtworkWidthCalculatorTest, TheWidestWithItsInsetsIs
     EXPECT_FALSE(cache->askedForNight);
 }
 
+TEST_F(TransitDirectionsListArtworkWidthCalculatorTest, ShieldsAreMeasuredForTheMainScreenByDay) {
+    const auto traits = UITraitCollection::system().overrideWith(
+        {.userInterfaceStyle = UIUserInterfaceStyle::Dark, .displayScale = 3});
+    (void)width({artwork("a")}, limits(20, 60));
+    EXPECT_EQ(cache->scales, std::set<double>{3});
+    EXPECT_FALSE(cache->askedForNight);
+}
+
+TEST_F(TransitDirectionsListArtworkWidthCalculatorTest, InsetsDoNotCountForWhichIsWidest) {
+    say("a", {0, 0, 0, 0, 0, 0, 0, 30});
+    say("b", {0, 0, 0, 0, 0, 0, 0, 20});
+    EXPECT_EQ(width({artwork("a"), artwork("b")}, limits(5, 60, {0, -10, 0, -10})), 10);
+    EXPECT_EQ(replacements->count(), 0U);
+}
+
+TEST_F(TransitDirectionsListArtworkWidthCalculatorTest, OfEquallyWideShieldsTheLaterShrinksFirst) {
+    say("a", {10, 10, 10, 10, 10, 10, 60, 80});
+    say("b", {10, 10, 10, 10, 10, 10, 75, 80});
+    const auto a = artwork("a");
+    const auto b = artwork("b");
+    EXPECT_EQ(width({a, b}, limits(20, 70)), 60);
+    EXPECT_EQ(shrinking(), (std::vector<std::string>{"b6", "a6", "b5"}));
+}
+
 TEST_F(TransitDirectionsListArtworkWidthCalculatorTest, ATooWideShieldShrinksSizeBySize) {
     const auto a = artwork("a"); // 70 points at size 7
     EXPECT_EQ(width({a}, limits(20, 45)), 40);
@@ -103,6 +137,7 @@ TEST_F(TransitDirectionsListArtworkWidthCalculatorTest, EachStepTakesWhatIsWides
     const auto a = artwork("a");
     const auto b = artwork("b");
     EXPECT_EQ(width({a, b}, limits(20, 75)), 70); // a: 90, 80, 60; b: 85, 70
+    EXPECT_EQ(shrinking(), (std::vector<std::string>{"a6", "b6", "a5"}));
     EXPECT_EQ(sizeOf(a), 5);
     EXPECT_EQ(sizeOf(b), 6);
 }
