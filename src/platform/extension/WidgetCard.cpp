@@ -44,6 +44,11 @@ CGSize sizeOf(UILabel& label, CGFloat width) {
     return {std::max<CGFloat>(std::min(wanted.width, width), 0), wanted.height};
 }
 
+/// How much of the icon's square is empty on either side: the fixed images are the same on both.
+CGFloat emptyBeside(const std::shared_ptr<UIImage>& icon) {
+    return icon ? icon->alignmentRectInsets().left * IconSide / icon->size().width : 0;
+}
+
 /// Where its capitals stand in the middle of the header.
 CGFloat topOf(const UILabel& label, const UIView& card) {
     const auto& font = *label.font();
@@ -137,8 +142,11 @@ void WidgetCard::layoutSubviews() {
     constexpr auto margin = WidgetHost::SideMargin;
     const auto button = _button->isHidden() ? CGSize{} : sizeOf(*_button, size.width / 2);
     place(*_button, size.width - margin - button.width, topOf(*_button, *this), button);
-    place(*_icon, margin, (HeaderHeight - IconSide) / 2, {IconSide, IconSide});
-    const auto nameStart = _icon->image() ? margin + IconSide + IconSpacing : margin;
+    // What one sees of the icon begins where the texts below it do.
+    const auto iconEmpty = emptyBeside(_icon->image());
+    const auto iconStart = margin - iconEmpty;
+    place(*_icon, iconStart, (HeaderHeight - IconSide) / 2, {IconSide, IconSide});
+    const auto nameStart = _icon->image() ? iconStart + IconSide - iconEmpty + IconSpacing : margin;
     const auto nameEnd = size.width - margin - button.width - (button.width > 0 ? margin : 0);
     place(*_name, nameStart, topOf(*_name, *this), sizeOf(*_name, nameEnd - nameStart));
     _host->view()->setFrame(
@@ -161,7 +169,7 @@ void WidgetCard::drawRect(Canvas& canvas) {
          {label.size.width + 2 * RingDistance.width, label.size.height + 2 * RingDistance.height}},
         RingRadius,
         RingWidth,
-        UIColor::labelColor()->resolvedColorWithTraitCollection(traits));
+        UIColor::secondaryLabelColor()->resolvedColorWithTraitCollection(traits));
 }
 
 void WidgetCard::traitCollectionDidChange(const UITraitCollection& previous) {

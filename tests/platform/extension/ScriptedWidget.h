@@ -123,7 +123,8 @@ struct HostWorld {
         const Extension extension({.bundleIdentifier = "a.widget",
                                    .containingApplication = "a.map",
                                    .displayName = "A Widget",
-                                   .principalClass = "ScriptedWidget"},
+                                   .principalClass = "ScriptedWidget",
+                                   .iconName = iconName},
                                   [this] { return widget; });
         return WidgetHost::hostWithExtension_settings(extension, settings);
     }
@@ -136,6 +137,7 @@ struct HostWorld {
 
     TemporaryProfile profile;
     StoppedClock clock;
+    std::optional<std::string> iconName;
     std::shared_ptr<ScriptedWidget> widget = std::make_shared<ScriptedWidget>();
 };
 

@@ -77,6 +77,25 @@ TEST_F(WidgetCardTest, TheHeaderIsMirroredWhereOneReadsFromTheRight) {
     EXPECT_EQ(icon.origin.x + icon.size.width, 359 - 16);
 }
 
+TEST_F(WidgetCardTest, WhatOneSeesOfTheIconBeginsWhereTheTextsDo) {
+    iconName = "WidgetGenericTransit"; // a drawing of 14 in a square of 24
+    constexpr CGFloat Seen = 20.0 * 14 / 24;
+    constexpr CGFloat HalfPixel = 0.5;
+    const auto seenLeft = [](const UIView& icon) {
+        return icon.frame().origin.x + (icon.frame().size.width - Seen) / 2;
+    };
+    const auto card = shownCard();
+    const auto& icon = *card->subviews()[0];
+    const auto& name = *card->subviews()[1];
+    EXPECT_EQ(icon.frame().size, CGSize(20, 20));
+    EXPECT_NEAR(seenLeft(icon), 16, HalfPixel);
+    EXPECT_NEAR(name.frame().origin.x, 16 + Seen + 8, HalfPixel);
+    UITraitCollection::system().set(
+        {.layoutDirection = UIUserInterfaceLayoutDirection::RightToLeft});
+    const auto mirrored = shownCard();
+    EXPECT_NEAR(seenLeft(*mirrored->subviews()[0]) + Seen, 359 - 16, HalfPixel);
+}
+
 TEST_F(WidgetCardTest, ALongNameGivesWayToTheButton) {
     const auto card = shownCard();
     held->setWidth(200);
