@@ -207,14 +207,22 @@ class WindowTest(BusTest, WidgetTest):
 
     def open_widget(self, *words, **environment):
         process = subprocess.Popen([WIDGET, *words], cwd=self.home, stdout=subprocess.PIPE, stderr=subprocess.PIPE,
-                                   env={**self.environment, "DISPLAY": self.display, **environment})
+                                   env={**self.environment, **self.on_display(), **environment})
         for cleanup in (process.stdout.close, process.stderr.close, process.wait, process.kill):
             self.addCleanup(cleanup)
         self.process = process
         self.eventually(lambda: self.parts("list"), "the widget tells assistive tools of its rows")
+        self.find_window(process)
+        return process
+
+    def on_display(self):
+        """What tells a program which display to use."""
+        return {"DISPLAY": self.display}
+
+    def find_window(self, process):
+        """And types into it from now on."""
         self.window = self.xdotool("search", "--all", "--onlyvisible", "--pid", str(process.pid), "--name", ".").split()[0]
         self.xdotool("windowfocus", "--sync", self.window)
-        return process
 
     def close_widget(self, how=signal.SIGTERM):
         """As the person's closing; nothing was said."""

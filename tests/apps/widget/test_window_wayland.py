@@ -1,0 +1,58 @@
+"""The widget's window on a Wayland display that nobody looks at."""
+
+import glob
+import pathlib
+import shutil
+import subprocess
+import time
+import unittest
+
+from window_support import PATIENCE, WindowTest, works
+
+SOCKET = "orvo-test"
+
+
+class Wayland(WindowTest):
+    def setUp(self):
+        if not shutil.which("weston"):
+            self.skipTest("there is no weston")
+        if not glob.glob("/usr/lib/*/qt6/plugins/platforms/libqwayland-generic.so"):
+            self.skipTest("the toolkit has no plugin for Wayland (qt6-wayland)")
+        super().setUp()
+        self.start_compositor()
+        self.live_feed(works(1, "Works on 1"), works(2, "Works on 2"))
+
+    def start_compositor(self):
+        compositor = subprocess.Popen(
+            ["weston", "--backend=headless-backend.so", f"--socket={SOCKET}", "--idle-time=0", "--no-config"],
+            env=self.environment, stdout=subprocess.DEVNULL, stderr=subprocess.DEVNULL)
+        self.addCleanup(compositor.wait)
+        self.addCleanup(compositor.terminate)
+        socket = pathlib.Path(self.environment["XDG_RUNTIME_DIR"], SOCKET)
+        deadline = time.monotonic() + PATIENCE
+        while not socket.exists():
+            self.assertIsNone(compositor.poll(), "weston has ended")
+            self.assertLess(time.monotonic(), deadline, "weston makes no display")
+            time.sleep(0.02)
+
+    def on_display(self):
+        return {"WAYLAND_DISPLAY": SOCKET}
+
+    def find_window(self, process):
+        pass  # there is no other
+
+    def test_shows_rows_changes_its_mode_and_keeps_the_choice(self):
+        self.open_widget()
+        self.shows("2 advisories")
+        self.button().press()
+        self.shows("Works on 1", "Works on 2", "Good service")
+        self.close_widget()
+        self.open_widget()
+        self.shows("Works on 1", "Works on 2", "Good service")
+        self.parts("list item")[0].press()
+        self.eventually(lambda: "Works on 1" in self.handed_over(), "the row's incident is handed over")
+        self.close_widget()
+
+
+if __name__ == "__main__":
+    unittest.main()
