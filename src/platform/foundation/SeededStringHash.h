@@ -23,10 +23,22 @@ struct SeededStringHash {
     [[nodiscard]] std::size_t operator()(std::string_view text) const noexcept;
 };
 
+/// Hashes numbers that follow from what others chose, such as a line's.
+struct SeededNumberHash {
+    [[nodiscard]] std::size_t operator()(std::uint64_t number) const noexcept {
+        return scattered(number);
+    }
+};
+
 /// Tables of foreign text. Those with `std::string` keys are asked with views as well.
 template <class Key, class Value>
 using SeededTextMap = std::unordered_map<Key, Value, SeededStringHash, std::equal_to<>>;
 template <class Key>
 using SeededTextSet = std::unordered_set<Key, SeededStringHash, std::equal_to<>>;
+
+/// Tables of such numbers.
+template <class Value>
+using SeededNumberMap = std::unordered_map<std::uint64_t, Value, SeededNumberHash>;
+using SeededNumberSet = std::unordered_set<std::uint64_t, SeededNumberHash>;
 
 } // namespace orvo

@@ -4,6 +4,8 @@
 
 #include <gtest/gtest.h>
 
+#include <algorithm>
+
 namespace orvo {
 namespace {
 
@@ -32,6 +34,19 @@ TEST(SeededStringHash, ScatteringKeepsNumbersApart) {
     for (std::uint64_t number = 0; number < 1000; ++number)
         EXPECT_TRUE(seen.insert(scattered(number << 54U)).second);
     EXPECT_EQ(scattered(7), scattered(7));
+}
+
+TEST(SeededStringHash, NumbersThatWerePreparedForOneBucketAreSpread) {
+    SeededNumberMap<int> table;
+    table.reserve(1000);
+    const std::uint64_t buckets = table.bucket_count();
+    for (std::uint64_t number = 0; number < 1000; ++number)
+        table.emplace(number * buckets, 1);
+    ASSERT_EQ(table.bucket_count(), buckets);
+    std::size_t fullest = 0;
+    for (std::size_t bucket = 0; bucket < buckets; ++bucket)
+        fullest = std::max(fullest, table.bucket_size(bucket));
+    EXPECT_LT(fullest, 50U);
 }
 
 } // namespace

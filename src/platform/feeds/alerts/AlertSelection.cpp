@@ -7,13 +7,13 @@
 #include "platform/feeds/alerts/SelectorResolver.h"
 #include "platform/feeds/alerts/SelectorShapes.h"
 #include "platform/feeds/alerts/WireCursor.h"
+#include "platform/foundation/SeededStringHash.h"
 #include "platform/geoservices/FeedTransitIncident.h"
 
 #include <algorithm>
 #include <bit>
 #include <set>
 #include <string>
-#include <unordered_set>
 #include <utility>
 
 namespace orvo {
@@ -176,7 +176,7 @@ private:
     std::vector<std::uint64_t> _keys;    // of all entities, one after the other
     std::vector<std::size_t> _endOfKeys; // of each entity
     std::vector<bool> _isChosen;
-    std::unordered_set<std::uint64_t> _spreadKeys;
+    SeededNumberSet _spreadKeys;
 };
 
 namespace {

@@ -27,17 +27,33 @@ void ConcernedLines::addMentions(const Alert& alert, std::size_t member) {
     _broad.clear();
     for (const AlertSelector& selector : alert.selectors) {
         const bool isPart = SelectorResolver::namesPart(selector);
-        if (SelectorResolver::routeOf(selector).empty() &&
+        const bool isBroad = SelectorResolver::routeOf(selector).empty();
+        if (isBroad &&
             !_broad
                  .emplace(
                      selector.agencyId, selector.stopId, selector.routeType.value_or(-1), isPart)
                  .second)
             continue;
         _named.clear();
-        _resolver.resolve(selector, _named);
+        if (!isBroad || _broadLeft > 0)
+            _resolver.resolve(selector, _named);
+        if (isBroad && !takeBroad())
+            continue;
         for (const LineTable::Place place : _named)
             _mentions.push_back({place, isPart, member, selector.stopId});
     }
+}
+
+/// Whether there is room for the lines that a selector without a route named. Once there is none,
+/// the schedule is not asked for more.
+bool ConcernedLines::takeBroad() {
+    if (_broadLeft > 0 && _named.size() <= _broadLeft) {
+        _broadLeft -= _named.size();
+        return true;
+    }
+    _broadLeft = 0;
+    ++_lostSelectors;
+    return false;
 }
 
 void ConcernedLines::takeMention(const Mention& mention) {

@@ -32,6 +32,10 @@ public:
     /// Finds the lines of an incident, in the place of the last one's.
     void find(const Incident& incident);
 
+    /// How many selectors named too many lines to be followed, over all incidents: each may name
+    /// any line.
+    [[nodiscard]] std::size_t lostSelectors() const noexcept { return _lostSelectors; }
+
     [[nodiscard]] const std::vector<Line>& lines() const noexcept { return _lines; }
     /// The stops by which the line is concerned, sorted; none where it is concerned whole.
     [[nodiscard]] std::span<const std::string_view> stopsOf(const Line& line) const noexcept {
@@ -43,6 +47,11 @@ public:
     }
 
 private:
+    /// Lines named by selectors without a route, over all incidents. A few bytes of an alert name
+    /// all lines of an agency: many such alerts would take thousands of times the room of their
+    /// feed.
+    static constexpr std::size_t MostBroad = 4'000'000;
+
     /// One line named by one selector.
     struct Mention {
         LineTable::Place place;
@@ -56,6 +65,7 @@ private:
     };
 
     void addMentions(const Alert& alert, std::size_t member);
+    [[nodiscard]] bool takeBroad();
     void takeMention(const Mention& mention);
     void finishLine();
 
@@ -65,6 +75,8 @@ private:
     std::vector<std::size_t> _members;
     std::vector<Mention> _mentions;
     SelectorResolver::Places _named;
+    std::size_t _broadLeft = MostBroad;
+    std::size_t _lostSelectors = 0;
     std::set<std::tuple<std::string_view, std::string_view, std::int32_t, bool>> _broad;
 };
 

@@ -128,6 +128,8 @@ private:
             buildIncident(context, incident, lines);
         }
         _hasLostStops = resolver.hasLostStops();
+        _hasLostSelectors = _hasLostSelectors || lines.lostSelectors() > 0;
+        _result.statistics.add(AlertCount::UnreadableSelectors, lines.lostSelectors());
     }
 
     void buildIncident(const RecordContext& context,
@@ -139,11 +141,18 @@ private:
             return _result.statistics.add(AlertCount::AlertsOfNoLine, incident.members.size());
         const MemberPeriods periods = periodsOfMembers(incident);
         std::optional<IncidentRecords> records;
+        std::span<const std::size_t> members; // never none for a line
+        std::vector<IncidentPeriod> ofMembers;
         for (const ConcernedLines::Line& line : lines.lines()) {
             const std::size_t position = _askedAt[line.place];
             if (position == NotAsked)
                 continue;
-            for (const IncidentPeriod& period : periodsOf(lines.membersOf(line), periods)) {
+            // Mostly the same alerts name all lines: what they come to is not worked out again.
+            if (!std::ranges::equal(members, lines.membersOf(line))) {
+                members = lines.membersOf(line);
+                ofMembers = periodsOf(members, periods);
+            }
+            for (const IncidentPeriod& period : ofMembers) {
                 if (!records)
                     records.emplace(context, incident, lines);
                 _result.lines[position].incidents.push_back(records->record(line, period));

@@ -14,14 +14,15 @@ namespace {
 
 /// A feed that uses one identifier for many alerts does not mean translations.
 constexpr std::size_t MostUnderOneId = 16;
+/// No incident is told in more; each is compared with each.
+constexpr std::size_t MostLanguages = 100;
 
 constexpr std::string_view NoBreakSpace = "\u00A0";
 constexpr std::string_view NarrowNoBreakSpace = "\u202F";
 
 bool hasTag(const std::vector<AlertText>& texts, std::string_view tag) {
     return std::any_of(texts.begin(), texts.end(), [&](const AlertText& text) {
-        return text.language == tag || LanguagePreference::normalisedTag(text.language) ==
-                                           LanguagePreference::normalisedTag(tag);
+        return LanguagePreference::isSameTag(text.language, tag);
     });
 }
 
@@ -33,7 +34,7 @@ bool sharesLanguage(const std::vector<AlertText>& a, const std::vector<AlertText
 void addMissingLanguages(std::vector<AlertText>& texts, const std::vector<AlertText>& more) {
     const std::size_t known = texts.size();
     for (const AlertText& text : more)
-        if (known == 0 || !hasTag(texts, text.language))
+        if (known == 0 || (texts.size() < MostLanguages && !hasTag(texts, text.language)))
             texts.push_back(text);
 }
 
@@ -82,7 +83,8 @@ Incident* IncidentMerger::translationPartner(const Alert& alert, std::size_t sou
     std::size_t looked = 0;
     for (const std::size_t position : sameId->second) {
         Incident& incident = _incidents[position];
-        if (incident.effect == alert.effect && incident.members.front().source == source &&
+        if (incident.effect == alert.effect && incident.header.size() < MostLanguages &&
+            incident.members.front().source == source &&
             !sharesLanguage(incident.header, alert.header) &&
             !sharesLanguage(incident.description, alert.description))
             return &incident;
@@ -100,7 +102,7 @@ std::vector<Incident> IncidentMerger::take() {
 void IncidentMerger::mergeSameContent() {
     std::vector<Incident> merged;
     std::vector<std::string> contents;
-    std::unordered_map<std::uint64_t, std::size_t> positions;
+    SeededNumberMap<std::size_t> positions;
     merged.reserve(_incidents.size());
     contents.reserve(_incidents.size());
     positions.reserve(_incidents.size());

@@ -2,11 +2,11 @@
 
 #include "platform/feeds/alerts/Incident.h"
 #include "platform/feeds/alerts/LanguagePreference.h"
+#include "platform/foundation/SeededStringHash.h"
 
 #include <cstddef>
 #include <string>
 #include <string_view>
-#include <unordered_map>
 #include <vector>
 
 namespace orvo {
@@ -40,7 +40,7 @@ private:
     LanguagePreference _preference;
     std::vector<Incident> _incidents;
     std::size_t _source = 0;
-    std::unordered_map<std::string_view, std::vector<std::size_t>> _byId; // of the current source
+    SeededTextMap<std::string_view, std::vector<std::size_t>> _byId; // of the current source
 };
 
 } // namespace orvo

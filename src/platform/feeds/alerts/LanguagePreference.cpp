@@ -4,6 +4,7 @@
 
 #include <unicode/uloc.h>
 
+#include <algorithm>
 #include <array>
 #include <utility>
 
@@ -28,6 +29,18 @@ std::string_view unaliased(std::string_view language) {
         if (alias == language)
             return language_;
     return language;
+}
+
+char normalisedLetter(char c) noexcept {
+    if (c >= 'A' && c <= 'Z')
+        return static_cast<char>(c - 'A' + 'a');
+    return c == '_' || c == '/' ? '-' : c;
+}
+
+/// Without those around it.
+std::string_view withoutBlanks(std::string_view tag) noexcept {
+    tag.remove_prefix(std::min(tag.find_first_not_of(' '), tag.size()));
+    return tag.substr(0, tag.find_last_not_of(' ') + 1);
 }
 
 using LocaleFunction = int32_t (*)(const char*, char*, int32_t, UErrorCode*);
@@ -105,17 +118,15 @@ const AlertText* LanguagePreference::like(const AlertText& model,
 }
 
 std::string LanguagePreference::normalisedTag(std::string_view tag) {
-    std::string result(tag);
-    for (char& c : result) {
-        if (c >= 'A' && c <= 'Z')
-            c = static_cast<char>(c - 'A' + 'a');
-        else if (c == '_' || c == '/')
-            c = '-';
-    }
-    const std::size_t first = result.find_first_not_of(' ');
-    if (first == std::string::npos)
-        return {};
-    return result.substr(first, result.find_last_not_of(' ') - first + 1);
+    std::string result(withoutBlanks(tag));
+    std::ranges::transform(result, result.begin(), normalisedLetter);
+    return result;
+}
+
+bool LanguagePreference::isSameTag(std::string_view one, std::string_view other) noexcept {
+    return one == other ||
+           std::ranges::equal(
+               withoutBlanks(one), withoutBlanks(other), {}, normalisedLetter, normalisedLetter);
 }
 
 LanguagePreference::Language LanguagePreference::languageOf(std::string_view tag) {

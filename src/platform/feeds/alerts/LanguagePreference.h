@@ -1,11 +1,11 @@
 #pragma once
 
 #include "platform/feeds/alerts/Alert.h"
+#include "platform/foundation/SeededStringHash.h"
 
 #include <array>
 #include <string>
 #include <string_view>
-#include <unordered_map>
 #include <utility>
 #include <vector>
 
@@ -46,6 +46,8 @@ public:
 
     /// In small letters, with `-` between the parts and without what is no part of a tag.
     [[nodiscard]] static std::string normalisedTag(std::string_view tag);
+    /// Whether both are the same once normalised.
+    [[nodiscard]] static bool isSameTag(std::string_view one, std::string_view other) noexcept;
 
 private:
     struct Language {
@@ -64,7 +66,7 @@ private:
     Language _person;
     Language _agency;
     bool _isForPerson = true;
-    mutable std::unordered_map<std::string_view, Language> _known; // views into the messages
+    mutable SeededTextMap<std::string_view, Language> _known; // views into the messages
     /// Those last asked for: most messages have two languages, which take turns.
     mutable std::array<const std::pair<const std::string_view, Language>*, 2> _recent{};
 };

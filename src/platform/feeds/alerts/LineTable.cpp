@@ -1,6 +1,7 @@
 #include "platform/feeds/alerts/LineTable.h"
 
 #include "platform/feeds/alerts/ByteScan.h"
+#include "platform/foundation/SeededStringHash.h"
 
 #include <bit>
 
@@ -53,7 +54,7 @@ LineTable::Place LineTable::placeOfRoute(std::string_view routeId) const {
 }
 
 std::size_t LineTable::slotOf(std::string_view routeId) const noexcept {
-    return static_cast<std::size_t>(ByteScan::quickHash(routeId)) & (_slots.size() - 1);
+    return SeededStringHash()(routeId) & (_slots.size() - 1);
 }
 
 } // namespace orvo

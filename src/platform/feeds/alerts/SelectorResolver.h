@@ -3,9 +3,9 @@
 #include "platform/feeds/alerts/Alert.h"
 #include "platform/feeds/alerts/AlertStatistics.h"
 #include "platform/feeds/alerts/LineTable.h"
+#include "platform/foundation/SeededStringHash.h"
 
 #include <string_view>
-#include <unordered_map>
 #include <vector>
 
 namespace orvo {
@@ -52,7 +52,7 @@ private:
 
     const LineTable& _table;
     AlertStatistics& _statistics;
-    std::unordered_map<std::string_view, Places> _linesServing; // views into the messages
+    SeededTextMap<std::string_view, Places> _linesServing; // views into the messages
     bool _hasLostStops = false;
 };
 

@@ -8,7 +8,6 @@
 #include <optional>
 #include <string>
 #include <string_view>
-#include <unordered_map>
 #include <vector>
 
 namespace orvo {
@@ -67,7 +66,7 @@ public:
 
 private:
     Contents _contents;
-    std::unordered_map<std::uint64_t, std::size_t> _positions;
+    SeededNumberMap<std::size_t> _positions;
     SeededTextMap<std::string_view, std::uint64_t> _byRoute; // views into _contents
     std::map<std::string, std::vector<std::uint64_t>, std::less<>> _byAgency;
     std::map<int, std::vector<std::uint64_t>> _byType;

@@ -1,5 +1,7 @@
 #include "platform/feeds/schedule/LineSearch.h"
 
+#include "platform/foundation/SeededStringHash.h"
+
 #include <unicode/coleitr.h>
 #include <unicode/tblcoll.h>
 #include <unicode/uchar.h>
@@ -7,7 +9,6 @@
 #include <algorithm>
 #include <optional>
 #include <tuple>
-#include <unordered_map>
 #include <utility>
 
 namespace orvo {
@@ -56,7 +57,7 @@ struct LineSearch::Comparer {
 
     std::unique_ptr<icu::RuleBasedCollator> collator;
     std::unique_ptr<icu::CollationElementIterator> elements;
-    std::unordered_map<std::string, Words> agencies; // few names, on many lines
+    SeededTextMap<std::string, Words> agencies; // few names, on many lines
 
     explicit Comparer(const std::string& locale) {
         UErrorCode status = U_ZERO_ERROR;

@@ -55,6 +55,35 @@ TEST(ConcernedLines, AreInTheSchedulesOrderEachOnce) {
     EXPECT_EQ(concerned({{at("T1"), at("R2"), at("R1"), at("R2")}}), "R1#0 R2#0 T1#0");
 }
 
+TEST(ConcernedLines, SelectorsThatNameMillionsOfLinesTogetherAreLostAndCounted) {
+    constexpr std::size_t Lines = 2000;
+    LineIndex::Contents contents;
+    for (std::size_t i = 0; i < Lines; ++i) {
+        ScheduleLine& line = contents.lines.emplace_back();
+        line.routeId = "R" + std::to_string(i);
+        line.muid = lineMuid("town", line.routeId);
+        line.agencyId = "A";
+    }
+    const LineIndex index(std::move(contents));
+    const LineTable table(index);
+    AlertStatistics statistics;
+    SelectorResolver resolver(table, statistics);
+    ConcernedLines lines(resolver);
+    Alert alert;
+    alert.selectors = {agency("A")};
+    Incident incident;
+    incident.members.assign(1, {&alert, 0});
+    for (int i = 0; i < 2000; ++i)
+        lines.find(incident);
+    EXPECT_EQ(lines.lostSelectors(), 0U);
+    EXPECT_EQ(lines.lines().size(), Lines);
+    alert.selectors = {agency("A"), at("R7")};
+    lines.find(incident);
+    EXPECT_EQ(lines.lostSelectors(), 1U);
+    ASSERT_EQ(lines.lines().size(), 1U);
+    EXPECT_EQ(lines.lines().front().line->routeId, "R7");
+}
+
 TEST(ConcernedLines, StopsAreCollectedSortedAndEachOnce) {
     EXPECT_EQ(concerned({{at("R1", "S9"), at("R1", "S1"), at("R1", "S9")}}), "R1(S1,S9)#0");
 }

@@ -294,6 +294,29 @@ TEST(IncidentBuilder, UnreadableSelectorsMakeLinesWithoutAnIncidentUnknown) {
     EXPECT_EQ(result.result().error, nullptr);
 }
 
+TEST(IncidentBuilder, AlertsThatNameMillionsOfLinesTogetherLeaveLinesWithoutAnIncidentUnknown) {
+    auto contents = smallSchedule();
+    for (std::size_t i = 0; i < 2000; ++i) {
+        ScheduleLine line = contents.lines.front();
+        line.routeId = "X" + std::to_string(i);
+        line.muid = lineMuid("town", line.routeId);
+        contents.lines.push_back(line);
+    }
+    Alerts alerts;
+    for (int i = 0; i < 2000; ++i)
+        alerts.push_back(maker([&](AlertMaker& m) {
+            m.id = std::to_string(i);
+            m.header = {{"Over " + m.id, "en"}};
+            m.selectors = {Wire().bytes(1, "A1")};
+            m.activePeriods = {period(1, 2)};
+        }));
+    const auto index = std::make_shared<const LineIndex>(std::move(contents));
+    const Answer result(index, {source(message(alerts))}, query());
+    EXPECT_TRUE(result.line("R1").isUnknown);
+    EXPECT_TRUE(result.line("T1").isUnknown);
+    EXPECT_EQ(result.result().statistics.count(AlertCount::UnreadableSelectors), 4U);
+}
+
 TEST(IncidentBuilder, AStopThatTheScheduleCannotBeAskedAboutMakesLinesWithoutAnIncidentUnknown) {
     auto contents = smallSchedule();
     contents.stops.linesServingStop = [](std::string_view) {

@@ -171,4 +171,17 @@ TEST(IncidentMerger, ThreeEntitiesOfThreeLanguagesUnderOneIdentifierAreOneIncide
     }
 }
 
+TEST(IncidentMerger, AnEndlessListOfLanguagesIsCut) {
+    std::deque<std::string> tags;
+    std::deque<Alert> alerts;
+    for (int i = 0; i < 30'000; ++i) {
+        tags.push_back("l" + std::to_string(i));
+        alerts.push_back(alert("1", {{"Delay", tags.back()}}));
+    }
+    const auto incidents = merge(alerts);
+    ASSERT_EQ(incidents.size(), 1U);
+    EXPECT_EQ(incidents[0].members.size(), alerts.size());
+    EXPECT_EQ(incidents[0].header.size(), 100U);
+}
+
 } // namespace orvo::testing

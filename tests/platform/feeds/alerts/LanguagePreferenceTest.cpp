@@ -118,4 +118,15 @@ TEST(LanguagePreference, UntaggedTextsAreAPair) {
     EXPECT_EQ(pair("fr", {"en", ""}, {""}), "untagged/untagged");
 }
 
+TEST(LanguagePreference, TagsAreComparedAsTheyAreNormalised) {
+    const std::vector<std::string> tags = {
+        "", " ", "en", "EN", " en ", "en-US", "en_us", "en/US", "e n", "en-html", "de"};
+    for (const std::string& one : tags)
+        for (const std::string& other : tags)
+            EXPECT_EQ(LanguagePreference::isSameTag(one, other),
+                      LanguagePreference::normalisedTag(one) ==
+                          LanguagePreference::normalisedTag(other))
+                << one << " and " << other;
+}
+
 } // namespace orvo::testing
