@@ -100,6 +100,13 @@ class Used(WindowTest):
         self.click(self.parts("list item")[1])
         self.eventually(lambda: "Works on 1" not in self.handed_over(), "the line is handed over")
         self.assertIn("Works on 2", self.handed_over())
+        self.close_widget()
+        # The first tap ends the session; each tap is an action.
+        recorded = self.orvo("analytics", "--json").json
+        (session,) = recorded["sessions"]
+        self.assertEqual((session["end_state"], session["tapped_item_index"]), (1, 0))
+        self.assertEqual([incident["title"] for incident in session["incidents"]], ["Works on 1", "Works on 2"])
+        self.assertEqual([action["action"] for action in recorded["actions"]], [9001, 9001])
 
     def test_keys_do_all_that_a_pointer_does(self):
         self.keys("Tab", "Tab")
