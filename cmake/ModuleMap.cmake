@@ -31,13 +31,14 @@ set(MODULE_MAP
   "presentation: platform/foundation platform/uikit platform/uikit/table platform/geoservices platform/mapuikit shared widget/result handoff viewmodel analytics"
   "widget: platform/foundation platform/uikit platform/uikit/table platform/extension platform/geoservices platform/favorites platform/mapuikit shared widget/result fetching handoff analytics viewmodel presentation"
   "orvo/console: platform/foundation"
+  "orvo/window: orvo/console platform/foundation platform/protobuf platform/uikit platform/uikit/drawing platform/geoservices platform/favorites platform/feeds/schedule platform/mapuikit platform/settings"
   "print: orvo/console platform/foundation platform/uikit platform/uikit/drawing platform/uikit/text platform/uikit/table platform/extension platform/launchservices platform/geoservices platform/favorites platform/feeds platform/mapuikit platform/demo shared widget/result fetching handoff analytics viewmodel presentation widget"
-  "orvo: orvo/console platform/foundation platform/protobuf platform/uikit platform/launchservices platform/geoservices platform/favorites platform/feeds platform/feeds/schedule platform/feeds/alerts platform/feeds/http platform/mapuikit platform/demo shared widget/result fetching handoff"
+  "orvo: orvo/console orvo/window platform/foundation platform/protobuf platform/uikit platform/launchservices platform/geoservices platform/favorites platform/feeds platform/feeds/schedule platform/feeds/alerts platform/feeds/http platform/mapuikit platform/demo shared widget/result fetching handoff"
 )
 # platform/lockbox is a loadable library of its own, made without add_module; no other row may name it.
 # Third-party headers, and the only modules whose .cpp files may name them.
 set(THIRD_PARTY_MAP
-  "qt: platform/foundation platform/uikit/text platform/uikit/drawing platform/uikit platform/extension platform/feeds/http platform/mapuikit platform/launchservices platform/demo platform/settings platform/extension/window orvo"
+  "qt: platform/foundation platform/uikit/text platform/uikit/drawing platform/uikit platform/extension platform/feeds/http platform/mapuikit platform/launchservices platform/demo platform/settings platform/extension/window orvo/window orvo"
   "unicode/: platform/foundation platform/uikit/text platform/feeds/schedule platform/feeds/alerts orvo/console"
   "sqlite3: platform/sqlite"
   "zip: platform/feeds/schedule platform/demo"

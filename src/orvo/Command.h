@@ -24,6 +24,8 @@ public:
     [[nodiscard]] virtual bool changesWhatIsKept(const Arguments& /*arguments*/) const {
         return false;
     }
+    /// Whether the command shows windows where there is a display.
+    [[nodiscard]] virtual bool showsWindows() const { return false; }
     /// Whether the command makes the demonstration city itself, instead of finding it made by
     /// `--demo`.
     [[nodiscard]] virtual bool writesDemonstration() const { return false; }

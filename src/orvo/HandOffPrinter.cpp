@@ -1,47 +1,41 @@
 #include "orvo/HandOffPrinter.h"
 
 #include "orvo/FavoritesListCommand.h"
+#include "orvo/HandOffPage.h"
 #include "orvo/console/DisplayText.h"
 #include "orvo/console/PeriodText.h"
-#include "platform/foundation/NSArray.h"
 
 #include <algorithm>
 #include <fmt/format.h>
 #include <fmt/ranges.h>
 #include <ostream>
-#include <unordered_set>
 
 namespace orvo {
 
 namespace {
 
 constexpr std::size_t WidestText = 100;
-constexpr std::size_t MostNamedLines = 12;
 
-std::optional<double> secondsOf(const std::shared_ptr<NSDate>& date) {
-    return date ? std::optional(date->timeIntervalSince1970()) : std::nullopt;
-}
-
-/// The description where there is one, with the summary before it unless it begins so anyway,
-/// however the lines of the two are broken.
-std::string wholeText(const TransitStorageIncident& incident) {
-    const auto summary = incident.summary().value_or("");
-    const auto description = incident.fullDescription().value_or("");
-    if (description.empty() || summary.empty() ||
-        DisplayText::oneLine(description).starts_with(DisplayText::oneLine(summary)))
-        return description.empty() ? summary : description;
-    return summary + "\n\n" + description;
+/// The names of the lines that an incident concerns, as far as they are known here.
+std::string affectedLines(const IncidentPage::Incident& incident) {
+    std::vector<std::string> names;
+    for (const auto& line : incident.lines)
+        names.push_back(line.name);
+    if (incident.otherLines == 0)
+        return fmt::format("{}", fmt::join(names, ", "));
+    return fmt::format("{} and {} more", fmt::join(names, ", "), incident.otherLines);
 }
 
 } // namespace
 
 std::shared_ptr<NSError> HandOffPrinter::print(const HandOff::Content& content) {
-    if (const auto* line = std::get_if<HandOff::Line>(&content))
-        printLine(*line->line);
-    else if (const auto* incidents = std::get_if<HandOff::Incidents>(&content))
-        printIncidents(*incidents);
-    else
+    const auto page = incidentPageOf(content, _context);
+    if (!page)
         return printFavorites();
+    if (page->line)
+        printLine(*page);
+    else
+        printIncidents(*page);
     return nullptr;
 }
 
@@ -63,76 +57,46 @@ std::shared_ptr<NSError> HandOffPrinter::printFavorites() {
     return nullptr;
 }
 
-void HandOffPrinter::printLine(const TransitStorageLineItem& line) {
+void HandOffPrinter::printLine(const IncidentPage& page) const {
     const auto& terminal = _context.terminal();
-    const auto system = line.system() ? line.system()->name().value_or("") : "";
-    terminal.output() << terminal.styled(DisplayText::oneLine(line.name().value_or("")),
-                                         Terminal::Style::Bold)
-                      << (system.empty() ? "" : " · ") << DisplayText::oneLine(system) << '\n';
-    _line = &line;
-    const auto incidents = typed<TransitStorageIncident>(line.incidents());
-    if (incidents.empty())
+    const auto& line = *page.line;
+    terminal.output() << terminal.styled(line.name, Terminal::Style::Bold)
+                      << (line.detail.empty() ? "" : " · ") << line.detail << '\n';
+    if (page.incidents.empty())
         printParagraphs("Good service", Terminal::Style::Good);
-    for (std::size_t i = 0; i < incidents.size(); ++i) {
-        if (i > 0)
-            terminal.output() << '\n';
-        printIncident(*incidents[i], Length::Whole);
+    const char* gap = "";
+    for (const auto& incident : page.incidents) {
+        terminal.output() << gap;
+        printIncident(incident, Length::Whole);
+        gap = "\n";
     }
-    _line = nullptr;
 }
 
-void HandOffPrinter::printIncidents(const HandOff::Incidents& incidents) {
+void HandOffPrinter::printIncidents(const IncidentPage& page) const {
     const auto& terminal = _context.terminal();
-    const std::size_t count = incidents.incidents.size();
+    const auto count = page.incidents.size();
     terminal.output() << terminal.styled(
                              fmt::format("{} {}", count, count == 1 ? "incident" : "incidents"),
                              Terminal::Style::Bold)
                       << '\n';
-    for (const auto& incident : incidents.incidents) {
+    for (const auto& incident : page.incidents) {
         terminal.output() << '\n';
-        printIncident(*incident, Length::Short);
+        printIncident(incident, Length::Short);
     }
 }
 
-void HandOffPrinter::printIncident(const TransitStorageIncident& incident, Length length) {
-    const auto details = incident.details();
-    printParagraphs(incident.title().value_or(""), Terminal::Style::Advisory);
-    if (!details || !details->isUnknown)
-        printParagraphs(PeriodText::period(secondsOf(incident.startDate()),
-                                           secondsOf(incident.endDate()),
-                                           _context.now(),
-                                           details ? details->timeZone : std::nullopt),
-                        Terminal::Style::Faint);
+void HandOffPrinter::printIncident(const IncidentPage::Incident& incident, Length length) const {
+    printParagraphs(incident.title, Terminal::Style::Advisory);
+    if (!incident.isUnknown)
+        printParagraphs(
+            PeriodText::period(incident.start, incident.end, _context.now(), incident.timeZone),
+            Terminal::Style::Faint);
     if (const auto lines = affectedLines(incident); !lines.empty())
         printParagraphs("Lines: " + lines, Terminal::Style::Faint);
-    printParagraphs(length == Length::Whole ? wholeText(incident) : incident.summary().value_or(""),
+    printParagraphs(length == Length::Whole ? incident.text : incident.summary,
                     Terminal::Style::Plain);
-    if (details && details->link)
-        printParagraphs(*details->link, Terminal::Style::Faint);
-}
-
-std::string HandOffPrinter::affectedLines(const TransitStorageIncident& incident) {
-    std::unordered_set<std::uint64_t> muids;
-    std::vector<std::string> names;
-    for (const auto& entity : typed<TransitIncidentAffectedEntity>(incident.affectedEntities())) {
-        if (!muids.insert(entity->muid()).second || muids.size() > MostNamedLines)
-            continue;
-        if (auto name = lineName(entity->muid()))
-            names.push_back(DisplayText::oneLine(*name));
-    }
-    const auto others = muids.size() - names.size();
-    if (others == 0 || names.empty())
-        return fmt::format("{}", fmt::join(names, ", "));
-    return fmt::format("{} and {} more", fmt::join(names, ", "), others);
-}
-
-std::optional<std::string> HandOffPrinter::lineName(std::uint64_t muid) {
-    if (_line && _line->muid() == muid)
-        return _line->name();
-    std::shared_ptr<NSError> unreadable; // names are a help; without them the rest is still told
-    const auto schedules = _context.schedules(unreadable);
-    const auto line = schedules ? schedules->line(muid) : std::nullopt;
-    return line ? std::optional(line->name()) : std::nullopt;
+    if (incident.link)
+        printParagraphs(*incident.link, Terminal::Style::Faint);
 }
 
 void HandOffPrinter::printParagraphs(const std::string& text, Terminal::Style style) const {

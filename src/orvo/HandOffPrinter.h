@@ -2,6 +2,7 @@
 
 #include "orvo/CommandContext.h"
 #include "orvo/HandOff.h"
+#include "orvo/window/IncidentPage.h"
 
 namespace orvo {
 
@@ -19,16 +20,12 @@ private:
     enum class Length { Whole, Short };
 
     [[nodiscard]] std::shared_ptr<NSError> printFavorites();
-    void printLine(const TransitStorageLineItem& line);
-    void printIncidents(const HandOff::Incidents& incidents);
-    void printIncident(const TransitStorageIncident& incident, Length length);
+    void printLine(const IncidentPage& page) const;
+    void printIncidents(const IncidentPage& page) const;
+    void printIncident(const IncidentPage::Incident& incident, Length length) const;
     void printParagraphs(const std::string& text, Terminal::Style style) const;
-    /// The names of the lines that an incident concerns, as far as they are known here.
-    [[nodiscard]] std::string affectedLines(const TransitStorageIncident& incident);
-    [[nodiscard]] std::optional<std::string> lineName(std::uint64_t muid);
 
     CommandContext& _context;
-    const TransitStorageLineItem* _line = nullptr; ///< the one being printed
 };
 
 } // namespace orvo

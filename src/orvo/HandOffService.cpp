@@ -1,13 +1,26 @@
 #include "orvo/HandOffService.h"
 
 #include "orvo/HandOffError.h"
+#include "orvo/HandOffWindows.h"
 #include "platform/demo/DemoVisit.h"
+#include "platform/foundation/Environment.h"
 #include "platform/mapuikit/DesktopSystemController.h"
 
 #include <fmt/format.h>
 #include <ostream>
 
 namespace orvo {
+
+namespace {
+
+/// A process that was started for the demonstration city is asked about the person's own lines too.
+std::optional<EnvironmentSlot<ProfileFolders>::Override> ownProfile() {
+    if (Environment::profile().get().state != ProfileFolders::demonstration().state)
+        return std::nullopt;
+    return Environment::profile().overrideWith(ProfileFolders::standard());
+}
+
+} // namespace
 
 std::optional<HandOff> handOffOfAction(const std::string& action,
                                        const std::shared_ptr<NSData>& parameter,
@@ -54,6 +67,7 @@ std::shared_ptr<NSError> HandOffService::take(const std::vector<HandOff>& handOf
     _onRequest();
     std::shared_ptr<NSError> error;
     std::unique_ptr<DemoVisit> demonstration;
+    const auto own = request.usesDemonstration ? std::nullopt : ownProfile();
     if (request.usesDemonstration) {
         demonstration = DemoVisit::begin(DemoVisit::Purpose::Look, &error);
         if (!demonstration)
@@ -66,7 +80,12 @@ std::shared_ptr<NSError> HandOffService::take(const std::vector<HandOff>& handOf
                               : HandOffReceiver::Audience::Nobody;
     for (const auto& handOff : handOffs) {
         CommandContext context(_terminal); // the profile's stores, as they are now
-        if ((error = HandOffReceiver::take(handOff, context, audience)))
+        HandOffReceiver::Showing showing;
+        if (_windows)
+            showing = [&](const HandOff::Content& content) {
+                _windows->show(content, context, request.activationToken);
+            };
+        if ((error = HandOffReceiver::take(handOff, context, audience, showing)))
             break;
     }
     _terminal.output().flush();

@@ -7,14 +7,20 @@
 
 namespace orvo {
 
+class HandOffWindows;
+
 /// Answers what the application is asked over the bus: takes what is handed over, each in the
-/// profile that it is about.
+/// profile that it is about, and shows it where there are windows.
 class HandOffService final : public ApplicationRequestHandler {
 public:
-    /// `onRequest` is called before each request is looked at.
-    HandOffService(const Terminal& terminal, std::function<void()> onRequest)
+    /// `onRequest` is called before each request is looked at. `windows` may be nil; they must
+    /// outlive the service.
+    HandOffService(const Terminal& terminal,
+                   std::function<void()> onRequest,
+                   HandOffWindows* windows = nullptr)
         : _terminal(terminal)
-        , _onRequest(std::move(onRequest)) {}
+        , _onRequest(std::move(onRequest))
+        , _windows(windows) {}
 
     /// Shows the favourites.
     [[nodiscard]] std::shared_ptr<NSError> activate(const ApplicationRequest& request) override;
@@ -33,6 +39,7 @@ private:
 
     const Terminal& _terminal;
     std::function<void()> _onRequest;
+    HandOffWindows* _windows;
 };
 
 /// The hand-off that an action with its parameter (may be nil) means; nothing, with an error, for

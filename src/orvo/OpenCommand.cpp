@@ -8,8 +8,8 @@ CommandSpec OpenCommand::spec() const {
     return {.path = {"open"},
             .summary = "Open a URL of the map application",
             .description =
-                "Tells what the URL asks for, and keeps it for: orvo show. An orvo that serves the "
-                "session bus is told of it too.\n"
+                "Tells what the URL asks for, on a display in a window, and keeps it for: orvo "
+                "show. An orvo that runs already takes it over.\n"
                 "orvo://?t=r is the map, orvo://?favorites=2&t=r the favourite lines.",
             .operands = {{.name = "URL",
                           .help = "as orvo://?favorites=2&t=r; the map if you name none",

@@ -12,6 +12,7 @@ public:
     [[nodiscard]] bool changesWhatIsKept(const Arguments& /*arguments*/) const override {
         return true;
     }
+    [[nodiscard]] bool showsWindows() const override { return true; }
 };
 
 } // namespace orvo

@@ -8,6 +8,7 @@
 #include "orvo/DefaultsWriteCommand.h"
 #include "orvo/DemoCommand.h"
 #include "orvo/FavoritesAddCommand.h"
+#include "orvo/FavoritesEditCommand.h"
 #include "orvo/FavoritesListCommand.h"
 #include "orvo/FavoritesMoveCommand.h"
 #include "orvo/FavoritesRemoveCommand.h"
@@ -26,6 +27,7 @@
 #include "orvo/ShowCommand.h"
 #include "orvo/Version.h"
 #include "orvo/console/LanguageTag.h"
+#include "orvo/window/WindowApplication.h"
 #include "platform/demo/DemoVisit.h"
 #include "platform/foundation/ISO8601.h"
 #include "platform/foundation/NSDate.h"
@@ -54,6 +56,7 @@ Program::Program(Terminal terminal)
     add(std::make_unique<LinesCommand>());
     add(std::make_unique<FavoritesAddCommand>());
     add(std::make_unique<FavoritesListCommand>());
+    add(std::make_unique<FavoritesEditCommand>());
     add(std::make_unique<FavoritesMoveCommand>());
     add(std::make_unique<FavoritesRemoveCommand>());
     add(std::make_unique<FeedsAddCommand>());
@@ -155,6 +158,10 @@ ExitCode Program::runCommand(std::size_t index, const std::vector<std::string>& 
         return ExitCode::Answered;
     }
     Command& command = *_commands[index];
+    // First of all: what the options ask for may need an application object, and would make one
+    // that can have no windows.
+    if (command.showsWindows() && WindowApplication::haveDisplay())
+        WindowApplication::make();
     if (const auto code = applyGlobalOptions(arguments, command))
         return *code;
     CommandContext context(_terminal);

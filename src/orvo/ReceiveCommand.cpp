@@ -43,7 +43,8 @@ CommandSpec ReceiveCommand::spec() const {
             .summary = "Take what another program hands over",
             .description =
                 "For programs on a desktop without a session bus: the activity comes on the "
-                "standard input, as a binary property list. It is told, and kept for: orvo show.",
+                "standard input, as a binary property list. It is told, on a display in a window, "
+                "and kept for: orvo show.",
             .operands = {{.name = "ACTION",
                           .help = "what to do with it",
                           .count = OperandSpec::Count::One,

@@ -1,6 +1,7 @@
 #include "orvo/ServiceCommand.h"
 
 #include "orvo/HandOffService.h"
+#include "orvo/HandOffWindows.h"
 #include "platform/foundation/NSTimer.h"
 #include "platform/foundation/RunLoop.h"
 #include "platform/launchservices/ApplicationService.h"
@@ -21,15 +22,17 @@ std::optional<std::uint32_t> seconds(const std::string& text) {
     return result.ec == std::errc() && result.ptr == end ? std::optional(value) : std::nullopt;
 }
 
-/// Ends the main run loop when nothing was asked for some time.
+/// Ends the main run loop when nothing was asked for some time, and no window is open.
 class IdleEnd {
 public:
-    explicit IdleEnd(std::uint32_t idleSeconds)
+    /// `windows` may be nil.
+    IdleEnd(std::uint32_t idleSeconds, const HandOffWindows* windows)
         : _idleSeconds(idleSeconds) {
         if (_idleSeconds > 0)
             _timer = NSTimer::scheduledTimerWithTimeInterval_repeats_block(
-                _idleSeconds, false, [](const std::shared_ptr<NSTimer>&) {
-                    RunLoop::main().stop();
+                _idleSeconds, true, [windows](const std::shared_ptr<NSTimer>&) {
+                    if (!windows || !windows->isAnyOpen())
+                        RunLoop::main().stop();
                 });
     }
     IdleEnd(const IdleEnd&) = delete;
@@ -56,9 +59,10 @@ CommandSpec ServiceCommand::spec() const {
             .summary = "Serve the map application on the session bus",
             .description =
                 "Takes what the widget and the desktop hand over: URLs and activities. The bus "
-                "starts it by itself where orvo is installed. On a terminal it tells each; "
-                "everywhere it keeps the last one for: orvo show. It ends when nothing has been "
-                "asked of it for some time.",
+                "starts it by itself where orvo is installed. On a display it shows each in a "
+                "window, on a terminal it tells each; everywhere it keeps the last one for: orvo "
+                "show. It ends when nothing has been asked of it for some time and no window is "
+                "open.",
             .options = {{"idle",
                          "SECONDS",
                          fmt::format("after how long; {} if you say nothing, 0 for never",
@@ -73,8 +77,12 @@ ExitCode ServiceCommand::run(const Arguments& arguments, CommandContext& context
         return context.wrongUsage(fmt::format("--idle cannot be {}", *given),
                                   "Write a number of seconds.");
     auto& loop = RunLoop::main();
-    const IdleEnd idleEnd(*idle);
-    HandOffService handler(context.terminal(), [&] { idleEnd.postpone(); });
+    const auto windows = HandOffWindows::make();
+    const IdleEnd idleEnd(*idle, windows.get());
+    HandOffService handler(
+        context.terminal(), [&] { idleEnd.postpone(); }, windows.get());
+    if (windows)
+        windows->setAllClosed([&] { idleEnd.postpone(); });
     std::shared_ptr<NSError> error;
     const auto service =
         ApplicationService::start(HandOffReceiver::ApplicationIdentifier, handler, &error);

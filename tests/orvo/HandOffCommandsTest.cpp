@@ -2,6 +2,7 @@
 #include "orvo/HandOffReceiver.h"
 #include "orvo/HandOffService.h"
 #include "orvo/HandOffStore.h"
+#include "orvo/HandOffWindows.h"
 #include "orvo/HandOffWorld.h"
 
 #include <gmock/gmock.h>
@@ -142,6 +143,12 @@ TEST_F(HandOffCommandsTest, WhatWasKeptAndCannotBeReadIsAnError) {
     EXPECT_THAT(refused({"show"}), HasSubstr("hand-off.plist"));
 }
 
+TEST_F(HandOffCommandsTest, WithoutADisplayFavoritesAreNotEditedInAWindow) {
+    const auto said = refused({"favorites", "edit"});
+    EXPECT_THAT(said, HasSubstr("there is no display to show a window on"));
+    EXPECT_THAT(said, HasSubstr("orvo favorites add"));
+}
+
 TEST_F(HandOffCommandsTest, NothingIsTakenAtAnotherMoment) {
     for (const auto& words : {std::vector<std::string>{"open", "orvo://?t=r"},
                               std::vector<std::string>{"receive", "ContinueUserActivity"},
@@ -153,16 +160,35 @@ TEST_F(HandOffCommandsTest, NothingIsTakenAtAnotherMoment) {
     EXPECT_FALSE(HandOffStore::last(nullptr));
 }
 
+/// Windows as text: what was shown, with the leave to come to the front.
+class ShownAsText final : public HandOffWindows {
+public:
+    void show(const HandOff::Content& content,
+              CommandContext&,
+              const std::string& activationToken) override {
+        const auto* line = std::get_if<HandOff::Line>(&content);
+        shown += (line ? line->line->name().value_or("") : "favourites") + " of " +
+                 Environment::profile().get().data.filename().string() + " " + activationToken +
+                 "\n";
+    }
+    [[nodiscard]] bool isAnyOpen() const override { return !shown.empty(); }
+    void setAllClosed(std::function<void()>) override {}
+
+    std::string shown;
+};
+
 class HandOffServiceTest : public HandOffCommandsTest {
 protected:
     std::ostringstream output;
     Terminal::Settings settings{.outputIsTerminal = true};
     int requests = 0;
+    HandOffWindows* windows = nullptr;
 
     std::shared_ptr<NSError>
     ask(const std::function<std::shared_ptr<NSError>(HandOffService&)>& request) {
         const Terminal terminal(output, output, settings);
-        HandOffService service(terminal, [this] { ++requests; });
+        HandOffService service(
+            terminal, [this] { ++requests; }, windows);
         return request(service);
     }
 };
@@ -186,6 +212,28 @@ TEST_F(HandOffServiceTest, WhereNobodyLooksNothingIsPrinted) {
     EXPECT_FALSE(ask([](auto& service) { return service.openURLs({"orvo://?t=r"}, {}); }));
     EXPECT_EQ(output.str(), "");
     EXPECT_TRUE(HandOffStore::last(nullptr));
+}
+
+TEST_F(HandOffServiceTest, WhatIsTakenIsShownInAWindow) {
+    ShownAsText shown;
+    windows = &shown;
+    const auto bytes = testing::tapOnLine(testing::lineWith({}));
+    EXPECT_FALSE(ask([&](auto& service) {
+        return service.activateAction("ContinueUserActivity", bytes, {.activationToken = "token"});
+    }));
+    EXPECT_FALSE(ask([](auto& service) { return service.activate({}); }));
+    EXPECT_EQ(shown.shown, "U1 of data token\nfavourites of data \n");
+    EXPECT_TRUE(ask([](auto& service) { return service.openURLs({"http://x"}, {}); }));
+    EXPECT_EQ(shown.shown, "U1 of data token\nfavourites of data \n");
+}
+
+TEST_F(HandOffServiceTest, AProcessOfTheDemonstrationShowsThePersonsOwnLinesWhenAsked) {
+    const auto demo = Environment::profile().overrideWith(ProfileFolders::demonstration());
+    const auto standsStill = Environment::keepsWritesInMemory().overrideWith(true);
+    ShownAsText shown;
+    windows = &shown;
+    EXPECT_FALSE(ask([](auto& service) { return service.activate({}); }));
+    EXPECT_EQ(shown.shown, "favourites of group.com.zentu.Orvo \n");
 }
 
 TEST_F(HandOffServiceTest, WhatItCannotTakeIsAnErrorAndNotKept) {
