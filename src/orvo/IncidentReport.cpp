@@ -4,6 +4,7 @@
 #include "orvo/JsonParts.h"
 #include "orvo/console/DisplayText.h"
 #include "platform/favorites/StoredTransitLine.h"
+#include "platform/favorites/TransitStorageIncident.h"
 #include "platform/feeds/schedule/ScheduleStore.h"
 #include "platform/geoservices/FeedTransitIncident.h"
 
@@ -13,7 +14,7 @@ namespace orvo {
 
 namespace {
 
-std::optional<double> secondsOf(const std::shared_ptr<NSDate>& date) {
+std::optional<double> epochSecondsOf(const std::shared_ptr<NSDate>& date) {
     return date ? std::optional(date->timeIntervalSince1970()) : std::nullopt;
 }
 
@@ -35,15 +36,23 @@ std::string reasonOf(const TransitIncident& incident) {
     return DisplayText::oneLine(description.substr(begins ? summary.size() : 0));
 }
 
-IncidentReport::Incident reportOf(const TransitIncident& incident) {
-    FeedTransitIncident::Details details;
+FeedTransitIncident::Details detailsOf(const TransitIncident& incident) {
     if (const auto* feedIncident = dynamic_cast<const FeedTransitIncident*>(&incident))
-        details = feedIncident->details();
+        return feedIncident->details();
+    const auto* storage = dynamic_cast<const TransitStorageIncident*>(&incident);
+    return storage ? storage->details().value_or(FeedTransitIncident::Details())
+                   : FeedTransitIncident::Details();
+}
+
+} // namespace
+
+IncidentReport::Incident IncidentReport::incidentOf(const TransitIncident& incident) {
+    const auto details = detailsOf(incident);
     return {incident.muid(),
             incident.title().value_or(""),
             incident.summary().value_or(""),
-            secondsOf(incident.startDate()),
-            secondsOf(incident.endDate()),
+            epochSecondsOf(incident.startDate()),
+            epochSecondsOf(incident.endDate()),
             nameOf(details.severity),
             nameOf(details.effect),
             details.isPartOfLine,
@@ -52,8 +61,38 @@ IncidentReport::Incident reportOf(const TransitIncident& incident) {
             details.isUnknown ? reasonOf(incident) : std::string()};
 }
 
-void addIncident(JsonWriter& json, const IncidentReport::Incident& incident) {
-    json.beginObject();
+IncidentReport::Line IncidentReport::lineOf(const TransitLineItem& item,
+                                            const ScheduleStore* schedules) {
+    Line line;
+    if (const auto origin = originOf(item, schedules)) {
+        line.feed = origin->feed;
+        line.routeId = origin->routeId;
+    }
+    line.muid = item.muid();
+    line.name = item.name().value_or("");
+    line.system = item.system() ? item.system()->name().value_or("") : "";
+    for (const auto& incident : typed<TransitIncident>(item.incidents()))
+        line.incidents.push_back(incidentOf(*incident));
+    return line;
+}
+
+std::vector<IncidentReport::Line> IncidentReport::linesOf(const std::shared_ptr<NSArray>& items,
+                                                          const ScheduleStore* schedules) {
+    std::vector<Line> lines;
+    for (const auto& item : typed<TransitLineItem>(items))
+        lines.push_back(lineOf(*item, schedules));
+    return lines;
+}
+
+void IncidentReport::addMembers(JsonWriter& json, const Line& line) {
+    json.key("feed").value(line.feed);
+    json.key("route_id").value(line.routeId);
+    json.key("muid").value(fmt::format("{}", line.muid));
+    json.key("name").value(line.name);
+    json.key("system").value(line.system);
+}
+
+void IncidentReport::addMembers(JsonWriter& json, const Incident& incident) {
     json.key("muid").value(fmt::format("{}", incident.muid));
     json.key("title").value(incident.title);
     json.key("summary").value(incident.summary);
@@ -63,29 +102,6 @@ void addIncident(JsonWriter& json, const IncidentReport::Incident& incident) {
     json.key("effect").value(incident.effect);
     json.key("part").value(incident.isPartOfLine);
     json.key("unknown").value(incident.isUnknown);
-    json.endObject();
-}
-
-} // namespace
-
-std::vector<IncidentReport::Line> IncidentReport::linesOf(const std::shared_ptr<NSArray>& items,
-                                                          const ScheduleStore* schedules) {
-    std::vector<Line> lines;
-    for (const auto& item : typed<TransitLineItem>(items)) {
-        const auto origin = originOf(*item, schedules);
-        Line line;
-        if (origin) {
-            line.feed = origin->feed;
-            line.routeId = origin->routeId;
-        }
-        line.muid = item->muid();
-        line.name = item->name().value_or("");
-        line.system = item->system() ? item->system()->name().value_or("") : "";
-        for (const auto& incident : typed<TransitIncident>(item->incidents()))
-            line.incidents.push_back(reportOf(*incident));
-        lines.push_back(std::move(line));
-    }
-    return lines;
 }
 
 std::string IncidentReport::json() const {
@@ -95,14 +111,13 @@ std::string IncidentReport::json() const {
     json.key("lines").beginArray();
     for (const auto& line : lines) {
         json.beginObject();
-        json.key("feed").value(line.feed);
-        json.key("route_id").value(line.routeId);
-        json.key("muid").value(fmt::format("{}", line.muid));
-        json.key("name").value(line.name);
-        json.key("system").value(line.system);
+        addMembers(json, line);
         json.key("incidents").beginArray();
-        for (const auto& incident : line.incidents)
-            addIncident(json, incident);
+        for (const auto& incident : line.incidents) {
+            json.beginObject();
+            addMembers(json, incident);
+            json.endObject();
+        }
         json.endArray().endObject();
     }
     json.endArray();

@@ -1,7 +1,9 @@
 #pragma once
 
+#include "orvo/console/JsonWriter.h"
 #include "platform/foundation/NSArray.h"
 #include "platform/foundation/NSError.h"
+#include "platform/geoservices/TransitIncident.h"
 #include "platform/geoservices/TransitLineItem.h"
 
 #include <cstdint>
@@ -44,6 +46,10 @@ struct IncidentReport {
     std::vector<Line> lines;
     std::shared_ptr<NSError> error; ///< why there are no lines; nil when there is an answer
 
+    /// An incident as it came from a lookup, or a storable copy of one.
+    [[nodiscard]] static Incident incidentOf(const TransitIncident& incident);
+    /// @param schedules tells where a line comes from that does not say so itself; may be nil
+    [[nodiscard]] static Line lineOf(const TransitLineItem& item, const ScheduleStore* schedules);
     /// The lines of `TransitLineItem`s, in their order.
     /// @param schedules tells where a line comes from that does not say so itself; may be nil
     [[nodiscard]] static std::vector<Line> linesOf(const std::shared_ptr<NSArray>& items,
@@ -51,6 +57,10 @@ struct IncidentReport {
 
     /// The form that scripts rely on.
     [[nodiscard]] std::string json() const;
+    /// The members of a line but for its incidents, and those of an incident, into an object that
+    /// has begun.
+    static void addMembers(JsonWriter& json, const Line& line);
+    static void addMembers(JsonWriter& json, const Incident& incident);
 };
 
 } // namespace orvo

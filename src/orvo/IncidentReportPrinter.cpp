@@ -11,7 +11,7 @@ namespace orvo {
 
 namespace {
 
-constexpr std::size_t WidestText = 100;
+constexpr std::size_t WidestReport = 100;
 
 bool isComing(const IncidentReport::Incident& incident, double now) {
     return incident.start && *incident.start > now;
@@ -69,7 +69,7 @@ void IncidentReportPrinter::printIncident(const IncidentReport::Incident& incide
 void IncidentReportPrinter::printParagraph(const std::string& text, Terminal::Style style) const {
     const bool isPipe = !_terminal.settings().outputIsTerminal;
     const std::size_t columns =
-        isPipe ? std::string::npos : std::min(_terminal.settings().width, WidestText) - 2;
+        isPipe ? std::string::npos : std::min(_terminal.settings().width, WidestReport) - 2;
     for (const auto& line : DisplayText::wrap(DisplayText::oneLine(text), columns))
         _terminal.output() << "  " << _terminal.styled(line, style) << '\n';
 }

@@ -9,6 +9,9 @@ class ShowCommand final : public Command {
 public:
     [[nodiscard]] CommandSpec spec() const override;
     [[nodiscard]] ExitCode run(const Arguments& arguments, CommandContext& context) override;
+
+private:
+    [[nodiscard]] static ExitCode printJson(CommandContext& context);
 };
 
 } // namespace orvo

@@ -11,7 +11,9 @@ std::string bashReply(Completes what, const std::vector<std::string>& words) {
     if (const char* kind = machineWords(what))
         return fmt::format("_orvo_words {}", kind);
     if (what == Completes::File)
-        return "COMPREPLY=($(compgen -f -- \"$current\"))";
+        // Names of files hold blanks and stars; readline quotes them.
+        return "mapfile -t COMPREPLY < <(compgen -f -- \"$current\"); "
+               "compopt -o filenames 2>/dev/null";
     return fmt::format("COMPREPLY=($(compgen -W {} -- \"$current\"))",
                        quoted(fmt::format("{}", fmt::join(words, " "))));
 }
@@ -28,6 +30,37 @@ std::string bashOperands(const CommandSpec& command) {
     }
     return text;
 }
+
+/// Asks for names: the words come from schedules of strangers, and are never expanded.
+constexpr const char* BashNamesFunction = R"sh(
+_orvo_words() {
+    # The words come from schedules of strangers: they are compared and quoted, never expanded (as `compgen -W` would).
+    local word
+    while IFS= read -r word; do
+        [[ $word == "$current"* ]] || continue
+        # A colon begins a new word for readline: take away what stands before it.
+        if [[ $current == *:* && $COMP_WORDBREAKS == *:* ]]; then
+            word=${word#"${current%"${current##*:}"}"}
+        fi
+        printf -v word %q "$word"
+        COMPREPLY+=("$word")
+    done < <(orvo completion words "$1" $demo 2>/dev/null)
+}
+)sh";
+
+/// What stands before the cursor, without the options that have a value.
+constexpr const char* BashBeginning = R"sh(() {
+    local line=${COMP_LINE:0:COMP_POINT} previous=$3 place= word skip= demo=
+    local current=${line##* }
+    local -i operands=0
+    COMPREPLY=()
+    for word in "${COMP_WORDS[@]:1:COMP_CWORD-1}"; do
+        [[ $skip ]] && { skip=; continue; }
+        [[ $word == --demo ]] && demo=--demo
+        case $word in
+        # Where readline broke a word in two.
+        : | =) skip=1; continue ;;
+)sh";
 
 /// `--at | --language`: all options, of any command, after which a value stands.
 std::string optionsWithValues(const ProgramSpec& program) {
@@ -61,50 +94,32 @@ std::string bashCommand(const CommandSpec& command) {
 } // namespace
 
 std::string bash(const ProgramSpec& program) {
-    std::string text = R"sh(# bash completion for orvo, written by `orvo completion bash`
-
-_orvo_words() {
-    # The words come from schedules of strangers: they are compared and quoted, never expanded (as `compgen -W` would).
-    local word
-    while IFS= read -r word; do
-        [[ $word == "$current"* ]] || continue
-        # A colon begins a new word for readline: take away what stands before it.
-        if [[ $current == *:* && $COMP_WORDBREAKS == *:* ]]; then
-            word=${word#"${current%"${current##*:}"}"}
-        fi
-        printf -v word %q "$word"
-        COMPREPLY+=("$word")
-    done < <(orvo completion words "$1" $demo 2>/dev/null)
-}
-
-_orvo() {
-    local line=${COMP_LINE:0:COMP_POINT} previous=$3 place= word skip= demo=
-    local current=${line##* }
-    local -i operands=0
-    COMPREPLY=()
-    for word in "${COMP_WORDS[@]:1:COMP_CWORD-1}"; do
-        [[ $skip ]] && { skip=; continue; }
-        [[ $word == --demo ]] && demo=--demo
-        case $word in
-        # Where readline broke a word in two.
-        : | =) skip=1; continue ;;
-)sh";
+    const std::string function = functionName(program);
+    std::string text = fmt::format(
+        "# bash completion for {}, written by `{}`\n", program.name, origin(program, "bash"));
+    if (asksForNames(program))
+        text += BashNamesFunction;
+    text += fmt::format("\n_{}{}", function, BashBeginning);
     text += fmt::format("        {}) skip=1; continue ;;\n        -*) continue ;;\n        esac\n",
                         optionsWithValues(program));
-    text += "        case $place in\n";
+    const auto groups = groupsOf(program);
     const auto namesAfter = [&](const std::vector<std::string>& group) {
         std::vector<std::string> names;
         for (const auto& [name, explanation] : wordsAfter(program, group))
             names.push_back(name);
         return names;
     };
-    for (const auto& group : groupsOf(program))
+    if (!groups.empty())
+        text += "        case $place in\n";
+    for (const auto& group : groups)
         text += fmt::format("        {}) case $word in {}) place=\"${{place:+$place }}$word\"; "
                             "continue ;; esac ;;\n",
                             quoted(fmt::format("{}", fmt::join(group, " "))),
                             fmt::join(namesAfter(group), "|"));
-    text += "        esac\n        operands+=1\n    done\n    case $place in\n";
-    for (const auto& group : groupsOf(program)) {
+    if (!groups.empty())
+        text += "        esac\n";
+    text += "        operands+=1\n    done\n    case $place in\n";
+    for (const auto& group : groups) {
         auto names = namesAfter(group);
         if (group.empty())
             names.insert(names.end(), {"--help", "--version"});
@@ -114,7 +129,7 @@ _orvo() {
     }
     for (const auto& command : program.commands)
         text += bashCommand(command);
-    return text + "    esac\n}\n\ncomplete -F _orvo orvo\n";
+    return text + fmt::format("    esac\n}}\n\ncomplete -F _{} {}\n", function, program.name);
 }
 
 } // namespace orvo::Completion

@@ -7,9 +7,10 @@
 
 namespace orvo {
 
-/// Scripts that let a shell complete the program's words. They know all commands and options, and
-/// ask the program itself (`orvo completion words feeds|lines|favorites`) for names that only this
-/// machine has.
+/// Scripts that let a shell complete a program's words. They know all commands and options, and
+/// ask `orvo completion words feeds|lines|favorites` for names that only this machine has. A
+/// program may be one command, whose path is empty. Scripts of several programs do not get in each
+/// other's way.
 namespace Completion {
 
 /// `bash`, `zsh`, `fish`.

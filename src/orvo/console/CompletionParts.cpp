@@ -1,5 +1,8 @@
 #include "orvo/console/CompletionParts.h"
 
+#include <algorithm>
+#include <fmt/format.h>
+
 namespace orvo::Completion {
 
 const char* machineWords(Completes what) {
@@ -37,13 +40,35 @@ std::vector<std::pair<std::string, std::string>> wordsAfter(const ProgramSpec& p
 }
 
 std::set<std::vector<std::string>> groupsOf(const ProgramSpec& program) {
-    std::set<std::vector<std::string>> groups = {{}};
+    std::set<std::vector<std::string>> groups;
     for (const auto& command : program.commands) {
-        auto path = command.path;
-        path.pop_back();
-        groups.insert(path);
+        for (auto path = command.path; !path.empty();) {
+            path.pop_back();
+            groups.insert(path);
+        }
     }
     return groups;
+}
+
+bool asksForNames(const ProgramSpec& program) {
+    const auto asks = [](const auto& word) {
+        return machineWords(word.completes) != nullptr;
+    };
+    return std::ranges::any_of(program.commands, [&](const CommandSpec& command) {
+        return std::ranges::any_of(command.options, asks) ||
+               std::ranges::any_of(command.operands, asks);
+    });
+}
+
+std::string origin(const ProgramSpec& program, const std::string& shell) {
+    return fmt::format(
+        "{} {}completion {}", program.name, groupsOf(program).empty() ? "--" : "", shell);
+}
+
+std::string functionName(const ProgramSpec& program) {
+    std::string name = program.name;
+    std::ranges::replace(name, '-', '_');
+    return name;
 }
 
 std::string quoted(std::string text) {

@@ -18,8 +18,16 @@ namespace orvo::Completion {
 /// The words that may follow the path: each with a line of explanation.
 [[nodiscard]] std::vector<std::pair<std::string, std::string>>
 wordsAfter(const ProgramSpec& program, const std::vector<std::string>& path);
-/// Paths below which there are commands, the program's own (empty) one first.
+/// Paths below which there are commands, the program's own (empty) one first. None for a program
+/// that is one command.
 [[nodiscard]] std::set<std::vector<std::string>> groupsOf(const ProgramSpec& program);
+/// Whether some word is a name that only this machine has.
+[[nodiscard]] bool asksForNames(const ProgramSpec& program);
+/// What to type for the script: `orvo completion bash`; a program that is one command has an
+/// option.
+[[nodiscard]] std::string origin(const ProgramSpec& program, const std::string& shell);
+/// The program's name as shells take it for a function: `orvo_transit_widget`.
+[[nodiscard]] std::string functionName(const ProgramSpec& program);
 /// In single quotes, as POSIX shells read them.
 [[nodiscard]] std::string quoted(std::string text);
 

@@ -1,11 +1,38 @@
 #include "orvo/console/CompletionParts.h"
 
+#include <algorithm>
 #include <fmt/format.h>
 #include <fmt/ranges.h>
 
 namespace orvo::Completion {
 
 namespace {
+
+constexpr auto FishWordsFunctions = R"sh(
+# Whether the words so far, options left out, begin with exactly these.
+function __{0}_at
+    set -l given (string match -v -- '-*' (commandline -opc)[2..-1])
+    test (count $given) -ge (count $argv); or return 1
+    set -l n (count $argv)
+    test $n -eq 0; or test "$given[1..$n]" = "$argv"
+end
+# The same, with exactly that number of words after them; with at least that number.
+function __{0}_after -a number
+    set -l given (string match -v -- '-*' (commandline -opc)[2..-1])
+    test (count $given) -eq (math (count $argv) - 1 + $number); and __{0}_at $argv[2..-1]
+end
+function __{0}_from -a number
+    set -l given (string match -v -- '-*' (commandline -opc)[2..-1])
+    test (count $given) -ge (math (count $argv) - 1 + $number); and __{0}_at $argv[2..-1]
+end
+)sh";
+
+constexpr const char* FishNamesFunction =
+    R"sh(# The names that only this machine has, of the demonstration city where the line asks for it.
+function __orvo_words -a kind
+    orvo completion words $kind (string match -- --demo (commandline -opc))[1] 2>/dev/null
+end
+)sh";
 
 std::string fishCandidates(Completes what, const std::vector<std::string>& words) {
     if (const char* kind = machineWords(what))
@@ -15,12 +42,23 @@ std::string fishCandidates(Completes what, const std::vector<std::string>& words
     return words.empty() ? " -f" : fmt::format(" -f -a '{}'", fmt::join(words, " "));
 }
 
-std::string fishCommand(const CommandSpec& command) {
-    const std::string condition = fmt::format("__orvo_at {}", command.name());
+/// One word more, or none at the end of a line.
+std::string blankBefore(const std::string& words) {
+    return words.empty() ? "" : " " + words;
+}
+
+std::string fishCommand(const ProgramSpec& program, const CommandSpec& command) {
+    const std::string complete = fmt::format("complete -c {}", program.name);
+    const std::string function = functionName(program);
+    const std::string place = blankBefore(command.name());
+    // A program that is one command takes its options everywhere.
+    const std::string condition =
+        place.empty() ? "" : fmt::format(" -n '__{}_at{}'", function, place);
     std::string text;
     for (const auto& option : optionsOf(command)) {
         text += fmt::format(
-            "complete -c orvo -n '{}' -l {} -d {}{}\n",
+            "{}{} -l {} -d {}{}\n",
+            complete,
             condition,
             option.name,
             quoted(option.help),
@@ -30,54 +68,50 @@ std::string fishCommand(const CommandSpec& command) {
         const auto& operand = command.operands[i];
         const bool repeats = operand.count == OperandSpec::Count::OneOrMore ||
                              operand.count == OperandSpec::Count::Any;
-        text += fmt::format("complete -c orvo -n '{} {} {}'{}\n",
-                            repeats ? "__orvo_from" : "__orvo_after",
+        text += fmt::format("{} -n '__{}_{} {}{}'{}\n",
+                            complete,
+                            function,
+                            repeats ? "from" : "after",
                             i,
-                            command.name(),
+                            place,
                             fishCandidates(operand.completes, operand.words));
     }
     return text;
 }
 
+bool countsWords(const ProgramSpec& program) {
+    return std::ranges::any_of(program.commands, [](const CommandSpec& command) {
+        return !command.path.empty() || !command.operands.empty();
+    });
+}
+
 } // namespace
 
 std::string fish(const ProgramSpec& program) {
-    std::string text = R"sh(# fish completion for orvo, written by `orvo completion fish`
-
-# Whether the words so far, options left out, begin with exactly these.
-function __orvo_at
-    set -l given (string match -v -- '-*' (commandline -opc)[2..-1])
-    test (count $given) -ge (count $argv); or return 1
-    set -l n (count $argv)
-    test $n -eq 0; or test "$given[1..$n]" = "$argv"
-end
-# The same, with exactly that number of words after them; with at least that number.
-function __orvo_after -a number
-    set -l given (string match -v -- '-*' (commandline -opc)[2..-1])
-    test (count $given) -eq (math (count $argv) - 1 + $number); and __orvo_at $argv[2..-1]
-end
-function __orvo_from -a number
-    set -l given (string match -v -- '-*' (commandline -opc)[2..-1])
-    test (count $given) -ge (math (count $argv) - 1 + $number); and __orvo_at $argv[2..-1]
-end
-# The names that only this machine has, of the demonstration city where the line asks for it.
-function __orvo_words -a kind
-    orvo completion words $kind (string match -- --demo (commandline -opc))[1] 2>/dev/null
-end
-
-complete -c orvo -f
-complete -c orvo -n '__orvo_after 0' -l version -d 'show the version'
-)sh";
-    for (const auto& group : groupsOf(program)) {
+    const std::string function = functionName(program);
+    std::string text = fmt::format(
+        "# fish completion for {}, written by `{}`\n", program.name, origin(program, "fish"));
+    if (countsWords(program))
+        text += fmt::format(FishWordsFunctions, function);
+    if (asksForNames(program))
+        text += FishNamesFunction;
+    text += fmt::format("\ncomplete -c {} -f\n", program.name);
+    const auto groups = groupsOf(program);
+    if (!groups.empty())
+        text += fmt::format("complete -c {} -n '__{}_after 0' -l version -d 'show the version'\n",
+                            program.name,
+                            function);
+    for (const auto& group : groups) {
         for (const auto& [word, explanation] : wordsAfter(program, group))
-            text += fmt::format("complete -c orvo -n '__orvo_after 0{}{}' -a {} -d {}\n",
-                                group.empty() ? "" : " ",
-                                fmt::join(group, " "),
+            text += fmt::format("complete -c {} -n '__{}_after 0{}' -a {} -d {}\n",
+                                program.name,
+                                function,
+                                blankBefore(fmt::format("{}", fmt::join(group, " "))),
                                 word,
                                 quoted(explanation));
     }
     for (const auto& command : program.commands)
-        text += fishCommand(command);
+        text += fishCommand(program, command);
     return text;
 }
 

@@ -47,21 +47,16 @@ std::string zshCommand(const CommandSpec& command) {
     return text + " ;;\n";
 }
 
-} // namespace
-
-std::string zsh(const ProgramSpec& program) {
-    std::string text = R"sh(#compdef orvo
-# zsh completion for orvo, written by `orvo completion zsh`
-
-_orvo() {
-    local -a state line names
-    local place= word context
-    local -a demo=(${(M)words[2,CURRENT-1]:#--demo})
-    integer taken=0
+/// How many words say the command, and what may follow where they do not yet.
+std::string zshCommandChoice(const ProgramSpec& program) {
+    const auto groups = groupsOf(program);
+    if (groups.empty())
+        return "";
+    std::string text = R"sh(    integer taken=0
     for word in ${words[2,CURRENT-1]}; do
         case "$place/$word" in
 )sh";
-    for (const auto& group : groupsOf(program)) {
+    for (const auto& group : groups) {
         const std::string before = fmt::format("{}", fmt::join(group, " "));
         for (const auto& [word, explanation] : wordsAfter(program, group))
             text += fmt::format("        {}) place={}; ((taken++)) ;;\n",
@@ -69,25 +64,38 @@ _orvo() {
                                 quoted(before.empty() ? word : before + " " + word));
     }
     text += "        esac\n    done\n    case $place in\n";
-    for (const auto& group : groupsOf(program)) {
+    for (const auto& group : groups) {
         text += fmt::format("    {})\n        names=(",
                             quoted(fmt::format("{}", fmt::join(group, " "))));
         for (const auto& [word, explanation] : wordsAfter(program, group))
             text += fmt::format("\n            {}", quoted(zshText(word) + ":" + explanation));
         text += "\n        )\n        _describe command names\n        return ;;\n";
     }
-    text += "    esac\n    shift $taken words\n    ((CURRENT -= taken))\n    case $place in\n";
+    return text + "    esac\n    shift $taken words\n    ((CURRENT -= taken))\n";
+}
+
+} // namespace
+
+std::string zsh(const ProgramSpec& program) {
+    const bool asks = asksForNames(program);
+    std::string text =
+        fmt::format("#compdef {0}\n# zsh completion for {0}, written by `{1}`\n\n_{0}() {{\n",
+                    program.name,
+                    origin(program, "zsh"));
+    text += "    local -a state line names\n    local place= word context\n";
+    if (asks)
+        text += "    local -a demo=(${(M)words[2,CURRENT-1]:#--demo})\n";
+    text += zshCommandChoice(program) + "    case $place in\n";
     for (const auto& command : program.commands)
         text += zshCommand(command);
-    return text + R"sh(    esac
-    if [[ -n $state ]]; then
+    text += "    esac\n";
+    if (asks)
+        text += R"sh(    if [[ -n $state ]]; then
         names=(${(f)"$(orvo completion words $state $demo[1] 2>/dev/null)"})
         compadd -a names
     fi
-}
-
-_orvo "$@"
 )sh";
+    return text + fmt::format("}}\n\n_{} \"$@\"\n", program.name);
 }
 
 } // namespace orvo::Completion

@@ -4,12 +4,12 @@ import fcntl
 import os
 import pathlib
 import pty
-import shutil
 import struct
 import subprocess
 import termios
 import unittest
 
+from completing import Completing
 from support import PROGRAM, ProgramTest
 
 
@@ -99,7 +99,7 @@ class Settings(ProgramTest):
         self.refused(2, "defaults", "write", "k", "x", "--type", "integer")
 
 
-class Completions(ProgramTest):
+class Completions(Completing, ProgramTest):
     def test_installed_scripts_are_what_the_program_prints(self):
         folder = pathlib.Path(os.environ["ORVO_SOURCE"]) / "packaging/completions"
         for shell, name in (("bash", "orvo.bash"), ("zsh", "_orvo"), ("fish", "orvo.fish")):
@@ -121,26 +121,40 @@ class Completions(ProgramTest):
         routes = "route_id,agency_id,route_short_name,route_type\n" + quoted + '"new\nline",A,N,3\n'
         self.orvo("feeds", "add", "h", "--static", self.schedule(routes=routes), "--alerts", "nowhere.pb")
 
-    def complete_in_fish(self, line):
-        """What fish offers at the end of the line."""
-        script = self.write("completion.fish", self.orvo("completion", "fish").out.encode())
-        environment = dict(self.environment, PATH=f"{os.path.dirname(PROGRAM)}:{self.environment['PATH']}", LINE=line)
-        finished = subprocess.run(["fish", "--no-config", "-c", f"source {script}; complete -C $LINE"], env=environment,
-                                  cwd=self.home, capture_output=True, check=True, timeout=60)
-        self.assertEqual(finished.stderr, b"")
-        return sorted(offer.split("\t")[0] for offer in finished.stdout.decode().splitlines())
+    def offered(self, shell, line):
+        """What that shell offers at the end of the line."""
+        return getattr(self, f"offered_by_{shell}")(self.orvo("completion", shell).out, line, [os.path.dirname(PROGRAM)])
 
-    @unittest.skipUnless(shutil.which("fish"), "no fish")
-    def test_fish_offers_commands_options_and_this_machines_names(self):
-        self.assertEqual(self.complete_in_fish("orvo fe"), ["feeds"])
-        self.assertEqual(self.complete_in_fish("orvo feeds re"), ["remove"])
-        self.assertIn("--json", self.complete_in_fish("orvo incidents --"))
-        self.assertEqual(self.complete_in_fish("orvo settings step-free o"), ["off", "on"])
+    def offers_commands_options_and_this_machines_names(self, shell):
+        self.assertEqual(self.offered(shell, "orvo fe"), ["feeds"])
+        self.assertEqual(self.offered(shell, "orvo feeds re"), ["remove"])
+        self.assertIn("--json", self.offered(shell, "orvo incidents --"))
+        self.assertEqual(self.offered(shell, "orvo settings step-free o"), ["off", "on"])
         self.hostile_city()
-        self.assertEqual(self.complete_in_fish("orvo feeds check "), ["h"])
-        self.assertIn("h:$(touch x)", self.complete_in_fish("orvo favorites add h:"))
-        self.assertEqual(self.complete_in_fish("orvo favorites add --demo city:S"), ["city:S1", "city:SKY"])
+        self.assertEqual(self.offered(shell, "orvo feeds check "), ["h"])
+
+    def test_fish_offers_commands_options_and_this_machines_names(self):
+        self.offers_commands_options_and_this_machines_names("fish")
+        self.assertIn("h:$(touch x)", self.offered("fish", "orvo favorites add h:"))
+        self.assertEqual(self.offered("fish", "orvo favorites add --demo city:S"), ["city:S1", "city:SKY"])
         self.assertFalse((self.home / "x").exists())
+
+    def test_zsh_offers_commands_options_and_this_machines_names(self):
+        self.offers_commands_options_and_this_machines_names("zsh")
+        self.assertIn(r"h:\$\(touch\ x\)", self.offered("zsh", "orvo favorites add h:"))
+        self.assertEqual(self.offered("zsh", "orvo favorites add --demo city:S"), ["city:S1", "city:SKY"])
+        self.assertFalse((self.home / "x").exists())
+
+    def test_bash_offers_commands_options_and_this_machines_names(self):
+        self.offers_commands_options_and_this_machines_names("bash")
+        self.orvo("feeds", "add", "city", "--static", self.schedule("other"), "--alerts", "nowhere.pb")
+        self.assertEqual(self.offered("bash", "orvo favorites add city:r"), ["r1", "r2", "r3"])
+
+    def test_files_are_offered_where_a_file_stands(self):
+        (self.home / "a schedule").mkdir()
+        for shell in ("bash", "zsh", "fish"):
+            offered = self.offered(shell, "orvo feeds add city --static a")
+            self.assertEqual([offer.rstrip("/").replace("\\", "") for offer in offered], ["a schedule"], shell)
 
     def test_bash_expands_nothing_that_strangers_wrote(self):
         self.hostile_city()
@@ -160,34 +174,10 @@ class Completions(ProgramTest):
         self.assertEqual([path.name for path in self.home.iterdir() if path.name in ("x", "y")], [])
 
     def test_bash_asks_the_demonstration_where_the_line_does(self):
-        self.assertEqual(self.complete("orvo favorites add city:S"), [])
-        self.assertEqual(self.complete("orvo favorites add --demo city:S"), ["S1", "SKY"])
-        self.assertEqual(self.complete("orvo --demo favorites add city:S"), ["S1", "SKY"])
-        self.assertIn("--demo", self.complete("orvo incidents --"))
-
-    def complete(self, line):
-        """What bash offers at the end of the line."""
-        script = self.write("completion.bash", self.orvo("completion", "bash").out.encode())
-        words = line.split(" ")
-        commands = f"""
-            source {script}
-            PATH={os.path.dirname(PROGRAM)}:$PATH
-            COMP_WORDS=({' '.join(f"'{word}'" for word in words)})
-            COMP_CWORD={len(words) - 1} COMP_LINE='{line}' COMP_POINT={len(line)}
-            _orvo orvo '{words[-1]}' '{words[-2]}'
-            printf '%s\\n' "${{COMPREPLY[@]}}"
-        """
-        finished = subprocess.run(["bash", "-c", commands], env=self.environment, capture_output=True, check=True)
-        return sorted(finished.stdout.decode().split())
-
-    def test_bash_offers_commands_options_and_this_machines_names(self):
-        self.assertEqual(self.complete("orvo fe"), ["feeds"])
-        self.assertEqual(self.complete("orvo feeds re"), ["remove"])
-        self.assertIn("--json", self.complete("orvo incidents --"))
-        self.assertEqual(self.complete("orvo settings step-free o"), ["off", "on"])
-        self.orvo("feeds", "add", "city", "--static", self.schedule(), "--alerts", "nowhere.pb")
-        self.assertEqual(self.complete("orvo feeds check "), ["city"])
-        self.assertEqual(self.complete("orvo favorites add city:r"), ["r1", "r2", "r3"])
+        self.assertEqual(self.offered("bash", "orvo favorites add city:S"), [])
+        self.assertEqual(self.offered("bash", "orvo favorites add --demo city:S"), ["S1", "SKY"])
+        self.assertEqual(self.offered("bash", "orvo --demo favorites add city:S"), ["S1", "SKY"])
+        self.assertIn("--demo", self.offered("bash", "orvo incidents --"))
 
 
 class OnATerminal(ProgramTest):

@@ -9,6 +9,9 @@ namespace orvo {
 namespace {
 
 using ::testing::HasSubstr;
+using ::testing::IsEmpty;
+using ::testing::Not;
+using ::testing::StartsWith;
 
 ProgramSpec sampleProgram() {
     return {"orvo",
@@ -52,6 +55,64 @@ TEST(Completion, EveryShellAsksTheProgramForThisMachinesNames) {
 TEST(Completion, BracketsAndColonsOfTheHelpAreNoSyntaxForZsh) {
     EXPECT_THAT(Completion::script(sampleProgram(), "zsh"),
                 HasSubstr("'--file[a \\[file\\]\\: any]:PATH:_files'"));
+}
+
+TEST(Completion, BashTakesNamesOfFilesAsTheyAre) {
+    EXPECT_THAT(Completion::script(sampleProgram(), "bash"),
+                HasSubstr("--file) mapfile -t COMPREPLY < <(compgen -f -- \"$current\");"));
+}
+
+TEST(Completion, GroupsAreThePathsAboveAnyCommand) {
+    using Paths = std::set<std::vector<std::string>>;
+    EXPECT_EQ(Completion::groupsOf(sampleProgram()), (Paths{{}, {"feeds"}}));
+    const ProgramSpec deep{"p", "", {{.path = {"a", "b", "c"}, .summary = "", .description = ""}}};
+    EXPECT_EQ(Completion::groupsOf(deep), (Paths{{}, {"a"}, {"a", "b"}}));
+}
+
+/// A program that is one command.
+ProgramSpec onlyCommand() {
+    return {"some-program",
+            "",
+            {{.path = {},
+              .summary = "Does it",
+              .description = "",
+              .options = {{.name = "form",
+                           .value = "FORM",
+                           .help = "how",
+                           .completes = Completes::Word,
+                           .words = {"text", "json"}},
+                          {.name = "quick", .value = "", .help = "soon"}}}}};
+}
+
+TEST(Completion, AProgramThatIsOneCommandHasOptionsAndNoWordsBeforeThem) {
+    EXPECT_THAT(Completion::groupsOf(onlyCommand()), IsEmpty());
+    EXPECT_THAT(Completion::wordsAfter(onlyCommand(), {}), IsEmpty());
+    EXPECT_THAT(
+        Completion::script(onlyCommand(), "bash"),
+        HasSubstr("--form) COMPREPLY=($(compgen -W 'text json' -- \"$current\")); return ;;"));
+    EXPECT_THAT(Completion::script(onlyCommand(), "zsh"),
+                HasSubstr("'--form[how]:FORM:(text json)'"));
+    EXPECT_THAT(Completion::script(onlyCommand(), "fish"),
+                HasSubstr("complete -c some-program -l form -d 'how' -r -f -a 'text json'\n"
+                          "complete -c some-program -l quick -d 'soon' -f\n"));
+}
+
+TEST(Completion, SaysWhatItIsForAndWhatWroteIt) {
+    EXPECT_THAT(Completion::script(sampleProgram(), "bash"),
+                StartsWith("# bash completion for orvo, written by `orvo completion bash`\n"));
+    EXPECT_THAT(
+        Completion::script(onlyCommand(), "fish"),
+        StartsWith(
+            "# fish completion for some-program, written by `some-program --completion fish`\n"));
+    EXPECT_THAT(Completion::script(onlyCommand(), "zsh"), StartsWith("#compdef some-program\n"));
+}
+
+TEST(Completion, ScriptsOfSeveralProgramsShareNoFunction) {
+    for (const auto& shell : Completion::shells())
+        EXPECT_THAT(Completion::script(onlyCommand(), shell), Not(HasSubstr("orvo"))) << shell;
+    EXPECT_THAT(Completion::script(onlyCommand(), "bash"),
+                HasSubstr("\ncomplete -F _some_program some-program\n"));
+    EXPECT_THAT(Completion::script(onlyCommand(), "zsh"), HasSubstr("\n_some-program \"$@\"\n"));
 }
 
 } // namespace
