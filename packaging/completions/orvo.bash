@@ -31,7 +31,7 @@ _orvo() {
         case $place in
         '') case $word in incidents|lines|favorites|feeds|open|show|receive|service|analytics|settings|defaults|demo|completion|help) place="${place:+$place }$word"; continue ;; esac ;;
         'defaults') case $word in read|write|delete) place="${place:+$place }$word"; continue ;; esac ;;
-        'favorites') case $word in add|list|move|remove) place="${place:+$place }$word"; continue ;; esac ;;
+        'favorites') case $word in add|list|edit|move|remove) place="${place:+$place }$word"; continue ;; esac ;;
         'feeds') case $word in add|list|update|check|remove) place="${place:+$place }$word"; continue ;; esac ;;
         esac
         operands+=1
@@ -39,7 +39,7 @@ _orvo() {
     case $place in
     '') COMPREPLY=($(compgen -W 'incidents lines favorites feeds open show receive service analytics settings defaults demo completion help --help --version' -- "$current")) ;;
     'defaults') COMPREPLY=($(compgen -W 'read write delete' -- "$current")) ;;
-    'favorites') COMPREPLY=($(compgen -W 'add list move remove' -- "$current")) ;;
+    'favorites') COMPREPLY=($(compgen -W 'add list edit move remove' -- "$current")) ;;
     'feeds') COMPREPLY=($(compgen -W 'add list update check remove' -- "$current")) ;;
     'incidents')
         case $previous in
@@ -81,6 +81,14 @@ _orvo() {
         esac
         case $current in
         -*) COMPREPLY=($(compgen -W '--json --demo --at --language --help' -- "$current")) ;;
+        esac ;;
+    'favorites edit')
+        case $previous in
+        --at) COMPREPLY=($(compgen -W '' -- "$current")); return ;;
+        --language) COMPREPLY=($(compgen -W '' -- "$current")); return ;;
+        esac
+        case $current in
+        -*) COMPREPLY=($(compgen -W '--demo --at --language --help' -- "$current")) ;;
         esac ;;
     'favorites move')
         case $previous in

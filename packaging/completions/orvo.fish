@@ -42,6 +42,7 @@ complete -c orvo -n '__orvo_after 0 defaults' -a write -d 'Set one setting'
 complete -c orvo -n '__orvo_after 0 defaults' -a delete -d 'Forget one setting'
 complete -c orvo -n '__orvo_after 0 favorites' -a add -d 'Add lines, or a place, to the favourites'
 complete -c orvo -n '__orvo_after 0 favorites' -a list -d 'List the favourites in their order'
+complete -c orvo -n '__orvo_after 0 favorites' -a edit -d 'Edit the favourites in a window'
 complete -c orvo -n '__orvo_after 0 favorites' -a move -d 'Give a favourite another place in the order'
 complete -c orvo -n '__orvo_after 0 favorites' -a remove -d 'Remove favourites'
 complete -c orvo -n '__orvo_after 0 feeds' -a add -d 'Add a feed: a schedule and its alerts'
@@ -74,6 +75,10 @@ complete -c orvo -n '__orvo_at favorites list' -l demo -d 'use the demonstration
 complete -c orvo -n '__orvo_at favorites list' -l at -d 'answer for that moment, as 2024-07-24T01:28:40Z; nothing is written' -r -f
 complete -c orvo -n '__orvo_at favorites list' -l language -d 'the language to prefer in texts, as de or pt-BR' -r -f
 complete -c orvo -n '__orvo_at favorites list' -l help -d 'show this text' -f
+complete -c orvo -n '__orvo_at favorites edit' -l demo -d 'use the demonstration city'\''s profile instead of your own' -f
+complete -c orvo -n '__orvo_at favorites edit' -l at -d 'answer for that moment, as 2024-07-24T01:28:40Z; nothing is written' -r -f
+complete -c orvo -n '__orvo_at favorites edit' -l language -d 'the language to prefer in texts, as de or pt-BR' -r -f
+complete -c orvo -n '__orvo_at favorites edit' -l help -d 'show this text' -f
 complete -c orvo -n '__orvo_at favorites move' -l demo -d 'use the demonstration city'\''s profile instead of your own' -f
 complete -c orvo -n '__orvo_at favorites move' -l at -d 'answer for that moment, as 2024-07-24T01:28:40Z; nothing is written' -r -f
 complete -c orvo -n '__orvo_at favorites move' -l language -d 'the language to prefer in texts, as de or pt-BR' -r -f

@@ -1,5 +1,6 @@
 #include "viewmodel/OWTransitIncidentsDataSourceBuilder.h"
 
+#include "handoff/Doubles.h"
 #include "handoff/NSDataOrvoExtra.h"
 #include "handoff/NSURLOWOpenable.h"
 #include "handoff/OrvoActivity.h"
@@ -414,6 +415,41 @@ TEST_F(BuilderTest, FailedArchivingLeavesTheSummaryWithoutAnActivity) {
     EXPECT_FALSE(summary(world.list(lines(2, 0)))->userActivityData());
 }
 
+TEST_F(BuilderTest, RowsAreRewrittenBeforeTheReportAndShapedAfterIt) {
+    class Watching final : public OWTransitIncidentsAnalyticsDelegate {
+    public:
+        explicit Watching(const testing::KeyBundle& bundle)
+            : _bundle(bundle) {}
+        void recordInfoForLines_incidentDisplayed_incidentsToLineMapping(
+            const std::shared_ptr<NSArray>&,
+            const std::shared_ptr<NSArray>&,
+            const std::shared_ptr<NSMapTable>&) override {
+            keysBefore = _bundle.keys;
+        }
+        std::vector<std::string> keysBefore;
+
+    private:
+        const testing::KeyBundle& _bundle;
+    };
+    const auto analytics = std::make_shared<Watching>(*world.bundle);
+    const auto shared = line(1, {incident(10)}, {.name = "U1"});
+    const auto other = line(2, {incident(10), incident(20)}, {.name = "U2"});
+    (void)world.builder({shared, other, line(3, {incident(30)})}, 2, analytics)->listItem();
+    EXPECT_EQ(analytics->keysBefore,
+              (std::vector<std::string>{"TransitWidget_2_Lines_Prepended_Incident_Text"}));
+    ASSERT_EQ(world.bundle->keys.size(), 4U); // and then those of the overflow row
+    EXPECT_EQ(world.bundle->keys[1], "TransitWidget_Summary_advisory_count");
+}
+
+TEST_F(BuilderTest, MappingKnowsIncidentsByIdentity) {
+    const auto analytics = std::make_shared<RecordingAnalytics>();
+    const auto met = incident(10);
+    (void)world.builder({line(1, {met}), line(2, {incident(10)})}, 0, analytics)->listItem();
+    ASSERT_EQ(analytics->reports[0].mapping->count(), 1U);
+    EXPECT_TRUE(analytics->reports[0].mapping->objectForKey(met));
+    EXPECT_FALSE(analytics->reports[0].mapping->objectForKey(incident(10)));
+}
+
 class SharedRowTest : public BuilderTest {
 protected:
     /// The row of one incident that lines of these systems share, each line with a shield of its
@@ -455,6 +491,25 @@ TEST_F(SharedRowTest, IsGenericWhenALaterOneIsMissingOrDiffersOrNoneHasOne) {
     }
 }
 
+TEST_F(SharedRowTest, OnlyRowsOfSeveralLinesAreRewrittenAndKeepWhatIsNotTheirs) {
+    const auto openable = NSURLOWOpenable::openableWithURL(NSURL::URLWithString("orvo://?t=r"));
+    const auto row = [&] {
+        return OWTransitItem::initWithPrimaryText_secondaryText_artwork_artworkHidden_openable(
+            "Title", "Summary", nullptr, true, openable);
+    };
+    std::vector<_OWDisplayedRow> displayed{{row(), {line(1, {})}},
+                                           {row(), {line(2, {}), line(3, {})}}};
+    const auto alone = displayed[0].item;
+    const auto shared = displayed[1].item;
+    world.builder({})->_updateItemsAffectingSeveralLines_itemToLinesMap(displayed);
+    EXPECT_EQ(displayed[0].item, alone);
+    ASSERT_NE(displayed[1].item, shared);
+    EXPECT_EQ(displayed[1].item->primaryText(), "Title");
+    EXPECT_TRUE(displayed[1].item->isArtworkHidden());
+    EXPECT_EQ(displayed[1].item->openable(), openable);
+    EXPECT_EQ(displayed[1].lines.size(), 2U);
+}
+
 TEST_F(BuilderTest, SummaryShowsDistinctShieldsInRowOrderSharedRowsTheLinesOwn) {
     const auto system = testing::system("S", "S");
     const auto list = world.list(
@@ -483,8 +538,22 @@ TEST_F(BuilderTest, FavouritesURLNamesTypeTwoAndTheTransitMap) {
     const auto url = OWTransitIncidentsDataSourceBuilder::_urlForFavorites();
     ASSERT_TRUE(url);
     EXPECT_EQ(url->absoluteString().substr(0, 24), "orvo://?favorites=2&t=r&");
-    const auto row = summaryRow(world.list(lines(0, 1)));
-    EXPECT_TRUE(std::dynamic_pointer_cast<NSURLOWOpenable>(row->openable()));
+}
+
+TEST_F(BuilderTest, BothGoodServiceRowsOpenTheFavourites) {
+    for (const auto& row :
+         {summaryRow(world.list(lines(0, 1))), rows(world.list(lines(1, 1))).back()}) {
+        ASSERT_TRUE(std::dynamic_pointer_cast<NSURLOWOpenable>(row->openable()));
+        EXPECT_EQ(descriptionOf(row->openable()).substr(0, 23), "orvo://?favorites=2&t=r");
+    }
+}
+
+TEST_F(BuilderTest, FavouritesURLSharesTheSessionAndThenConvertsTheBuiltURL) {
+    const testing::OpeningDoubles doubles;
+    const auto url = OWTransitIncidentsDataSourceBuilder::_urlForFavorites();
+    EXPECT_EQ(*doubles.journal,
+              (std::vector<std::string>{"session callback=0 share=1 reset=0", "conversion"}));
+    EXPECT_EQ(url->absoluteString(), "orvo://?favorites=2&t=r&session=S1");
 }
 
 } // namespace
