@@ -1,13 +1,13 @@
-// The line items of a saved state of fifty lines, archived and read back, beside their bare content:
-// the same as plain messages, without an archive around them; in turn in every iteration.
+// A saved state of fifty lines, archived and read back, beside its bare content: the same lines as
+// plain messages, without an archive around them; in turn in every iteration.
 
 #include "platform/favorites/TransitStorageIncident.h"
 #include "platform/favorites/TransitStorageLineItem.h"
 #include "platform/foundation/CodingClass.h"
 #include "platform/foundation/NSKeyedArchiver.h"
-#include "platform/foundation/NSKeyedUnarchiver.h"
 #include "platform/geoservices/TransitIncidentRecord.h"
 #include "platform/geoservices/TransitLineItemRecord.h"
+#include "widget/OWTransitIncidentViewControllerState.h"
 
 #include <benchmark/benchmark.h>
 
@@ -19,8 +19,8 @@ using namespace orvo;
 
 constexpr int Lines = 50;
 
-std::vector<std::shared_ptr<TransitStorageLineItem>> makeLines() {
-    std::vector<std::shared_ptr<TransitStorageLineItem>> lines;
+std::vector<std::shared_ptr<TransitLineItem>> makeLines() {
+    std::vector<std::shared_ptr<TransitLineItem>> lines;
     for (int i = 0; i < Lines; ++i) {
         std::vector<std::shared_ptr<TransitIncident>> incidents;
         for (int k = 0; k <= i % 10; ++k)
@@ -30,12 +30,17 @@ std::vector<std::shared_ptr<TransitStorageLineItem>> makeLines() {
                  .title = "Delays",
                  .summary = "Ten minutes",
                  .fullDescription = std::string(400, 'x')}));
-        lines.push_back(
-            TransitStorageLineItem::initWithLineItem(TransitLineItemRecord::initWithFields_service(
-                {.muid = static_cast<std::uint64_t>(i + 1), .name = "Line " + std::to_string(i)},
-                {.incidents = NSArray::arrayOf(incidents)})));
+        lines.push_back(TransitLineItemRecord::initWithFields_service(
+            {.muid = static_cast<std::uint64_t>(i + 1), .name = "Line " + std::to_string(i)},
+            {.incidents = NSArray::arrayOf(incidents)}));
     }
     return lines;
+}
+
+std::shared_ptr<NSData>
+archiveOf(const std::shared_ptr<OWTransitIncidentViewControllerState>& savedState) {
+    return NSKeyedArchiver::archivedDataWithRootObject_requiringSecureCoding_error(savedState,
+                                                                                   true);
 }
 
 /// Processor time: other programs on the machine do not count.
@@ -54,7 +59,9 @@ double secondsOf(const Work& work) {
 EnvironmentSlot<std::shared_ptr<const CodingClassTable>>::Override storableClasses() {
     return CodingClassTable::current().overrideWith(std::make_shared<const CodingClassTable>(
         CodingClassTable{CodingClass::of<TransitStorageIncident>("TransitStorageIncident"),
-                         CodingClass::of<TransitStorageLineItem>("TransitStorageLineItem")}));
+                         CodingClass::of<TransitStorageLineItem>("TransitStorageLineItem"),
+                         CodingClass::of<OWTransitIncidentViewControllerState>(
+                             "OWTransitIncidentViewControllerState")}));
 }
 
 void report(benchmark::State& state, double archiving, double yardstick, std::size_t bytes) {
@@ -66,19 +73,16 @@ void report(benchmark::State& state, double archiving, double yardstick, std::si
 void write(benchmark::State& state) {
     const auto classes = storableClasses();
     const auto lines = makeLines();
-    const auto root = NSArray::arrayOf(lines);
+    const auto savedState = OWTransitIncidentViewControllerState::initWithLineItemsResult_expanded(
+        Result::resultWithValue(NSArray::arrayOf(lines)), true);
     double archiving = 0;
     double bare = 0;
     std::size_t bytes = 0;
     for (auto _ : state) {
-        const double once = secondsOf([&] {
-            const auto data =
-                NSKeyedArchiver::archivedDataWithRootObject_requiringSecureCoding_error(root, true);
-            bytes = data->length();
-        });
+        const double once = secondsOf([&] { bytes = archiveOf(savedState)->length(); });
         bare += secondsOf([&] {
             for (const auto& line : lines)
-                benchmark::DoNotOptimize(line->data());
+                benchmark::DoNotOptimize(TransitStorageLineItem::initWithLineItem(line)->data());
         });
         archiving += once;
         state.SetIterationTime(once);
@@ -89,17 +93,17 @@ void write(benchmark::State& state) {
 void read(benchmark::State& state) {
     const auto classes = storableClasses();
     const auto lines = makeLines();
-    const auto archive = NSKeyedArchiver::archivedDataWithRootObject_requiringSecureCoding_error(
-        NSArray::arrayOf(lines), true);
+    const auto archive =
+        archiveOf(OWTransitIncidentViewControllerState::initWithLineItemsResult_expanded(
+            Result::resultWithValue(NSArray::arrayOf(lines)), true));
     std::vector<std::shared_ptr<NSData>> messages;
     for (const auto& line : lines)
-        messages.push_back(line->data());
-    const std::vector<std::string> allowed{"NSArray", "TransitStorageLineItem"};
+        messages.push_back(TransitStorageLineItem::initWithLineItem(line)->data());
     double unarchiving = 0;
     double bare = 0;
     for (auto _ : state) {
         const double once = secondsOf([&] {
-            if (!NSKeyedUnarchiver::unarchivedObjectOfClasses_fromData_error(allowed, archive))
+            if (!OWTransitIncidentViewControllerState::unarchiveFromData_error(archive, nullptr))
                 state.SkipWithError("the archive cannot be read");
         });
         bare += secondsOf([&] {
