@@ -74,7 +74,7 @@ ExitCode CompletionCommand::printWords(const std::string& kind, CommandContext& 
     const auto schedules = context.schedules(error);
     if (!schedules)
         return context.fail(*error);
-    for (const auto& feed : schedules->feeds()) {
+    for (const auto& feed : schedules->feeds(&error)) {
         if (kind == "feeds") {
             output << feed << '\n';
             continue;

@@ -18,11 +18,30 @@ std::optional<std::string> textOrNull(const std::optional<ScheduleInfo>& info,
     return info && !((*info).*member).empty() ? std::optional((*info).*member) : std::nullopt;
 }
 
-std::string json(const FeedChoice& choice, const ScheduleStore* schedules, double now) {
+/// By feed, in its place among them; nothing for one without a schedule.
+using Infos = std::vector<std::optional<ScheduleInfo>>;
+
+/// Nothing for all, with the reason in `error`, when the schedules cannot be read.
+Infos infosOf(const std::vector<FeedConfiguration>& feeds,
+              CommandContext& context,
+              std::shared_ptr<NSError>& error) {
+    Infos infos(feeds.size());
+    std::shared_ptr<NSError> unread;
+    const auto schedules = context.schedules(unread);
+    for (std::size_t place = 0; !unread && place < feeds.size(); ++place)
+        infos[place] = schedules->info(feeds[place].name, &unread);
+    if (!unread)
+        return infos;
+    error = unread;
+    return Infos(feeds.size());
+}
+
+std::string json(const FeedChoice& choice, const Infos& infos, double now) {
     JsonWriter json;
     json.beginObject().key("feeds").beginArray();
-    for (const auto& feed : choice.feeds) {
-        const auto info = schedules ? schedules->info(feed.name) : std::nullopt;
+    for (std::size_t place = 0; place < choice.feeds.size(); ++place) {
+        const auto& feed = choice.feeds[place];
+        const auto& info = infos[place];
         json.beginObject();
         json.key("name").value(feed.name);
         json.key("lines").value(info ? info->lines : 0);
@@ -71,13 +90,13 @@ CommandSpec FeedsListCommand::spec() const {
 
 ExitCode FeedsListCommand::run(const Arguments& arguments, CommandContext& context) {
     auto choice = FeedChoice::of({}, context);
-    std::shared_ptr<NSError> storeError;
-    const auto schedules = context.schedules(storeError);
+    std::shared_ptr<NSError> unread;
+    const auto infos = infosOf(choice.feeds, context, unread);
     if (!choice.error)
-        choice.error = storeError;
+        choice.error = unread;
     const double now = context.now();
     if (arguments.has("json"))
-        context.terminal().output() << json(choice, schedules.get(), now);
+        context.terminal().output() << json(choice, infos, now);
     if (choice.error)
         return context.fail(*choice.error);
     if (arguments.has("json"))
@@ -90,8 +109,9 @@ ExitCode FeedsListCommand::run(const Arguments& arguments, CommandContext& conte
                      {"Checked", TextTable::Column::Alignment::Left, false},
                      {"Static"},
                      {"Alerts"}});
-    for (const auto& feed : choice.feeds) {
-        const auto info = schedules->info(feed.name);
+    for (std::size_t place = 0; place < choice.feeds.size(); ++place) {
+        const auto& feed = choice.feeds[place];
+        const auto& info = infos[place];
         std::string alerts;
         for (const auto& source : feed.alerts)
             alerts += (alerts.empty() ? "" : " ") + source.displayLocation();

@@ -31,19 +31,29 @@ std::string nameOf(std::string_view feed, std::string_view routeId) {
 }
 
 Answer resolve(const ScheduleStore& schedules, const std::string& text) {
-    const auto feeds = schedules.feeds();
+    std::shared_ptr<NSError> unread;
+    const auto unreadable = [&] {
+        return Answer{std::nullopt, unread->localizedDescription(), {}};
+    };
+    const auto feeds = schedules.feeds(&unread);
+    if (unread)
+        return unreadable();
     // A line's own name may hold a colon too, so only a known feed before it counts.
     const std::size_t colon = text.find(':');
     const std::string feed = text.substr(0, colon);
     if (colon != std::string::npos && std::ranges::count(feeds, feed) > 0) {
-        auto line = schedules.line(lineMuid(feed, text.substr(colon + 1)));
+        auto line = schedules.line(lineMuid(feed, text.substr(colon + 1)), &unread);
+        if (unread)
+            return unreadable();
         if (line && line->present)
             return {std::move(line), {}, {}};
         return {std::nullopt,
                 fmt::format("the schedule of {} has no line {}", feed, text.substr(colon + 1)),
                 fmt::format("Find its lines with: orvo lines {}", feed)};
     }
-    const auto lines = schedules.linesNamed(text);
+    const auto lines = schedules.linesNamed(text, &unread);
+    if (unread)
+        return unreadable();
     if (lines.size() == 1)
         return {lines.front(), {}, {}};
     if (lines.size() > 1)

@@ -142,7 +142,10 @@ ExitCode LinesCommand::run(const Arguments& arguments, CommandContext& context) 
         return context.fail(*error);
     if (arguments.has("json"))
         return ExitCode::Answered;
-    if (schedules->feeds().empty())
+    const bool hasFeeds = !schedules->feeds(&error).empty();
+    if (error)
+        return context.fail(*error);
+    if (!hasFeeds)
         return context.fail("there are no feeds yet", "Add one with: orvo feeds add");
     TextTable table({{"Line", TextTable::Column::Alignment::Left, false},
                      {"Short", TextTable::Column::Alignment::Left, false},

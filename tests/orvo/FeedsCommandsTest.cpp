@@ -84,6 +84,23 @@ TEST_F(FeedsCommandsTest, ListSaysHowLongAScheduleIsValid) {
     EXPECT_THAT(json, HasSubstr("\"error\": null"));
 }
 
+TEST_F(FeedsCommandsTest, SchedulesThatCannotBeReadAreToldAndAreNotLikeNone) {
+    addCity();
+    const auto store = ScheduleStore::defaultPath();
+    ASSERT_TRUE(SQLiteDatabase::open(store, SQLiteDatabase::Mode::Write, nullptr)
+                    ->execute("DROP TABLE feed"));
+    for (const auto& words : std::vector<std::vector<std::string>>{{"feeds", "list"},
+                                                                   {"feeds", "check"},
+                                                                   {"lines", "harbour"},
+                                                                   {"incidents", "--all"},
+                                                                   {"favorites", "add", "M1"},
+                                                                   {"favorites", "add", "city:M1"}})
+        EXPECT_THAT(refused(words), HasSubstr(store.string() + ": ")) << words.front();
+    const auto json = run({"feeds", "list", "--json"});
+    EXPECT_EQ(json.code, ExitCode::Failed);
+    EXPECT_THAT(json.output, HasSubstr(store.string() + ": "));
+}
+
 TEST_F(FeedsCommandsTest, UpdateSaysWhatCameAndWent) {
     addCity();
     write("schedule/routes.txt",
