@@ -36,6 +36,11 @@ std::size_t columnsOf(UChar32 c) {
     return width == U_EA_FULLWIDTH || width == U_EA_WIDE ? 2 : 1;
 }
 
+/// Identifiers come as feeds have them: one of these would turn the rest of its row around.
+bool turnsDirection(UChar32 c) {
+    return (c >= 0x202A && c <= 0x202E) || (c >= 0x2066 && c <= 0x2069);
+}
+
 } // namespace
 
 std::size_t width(std::string_view text) {
@@ -96,6 +101,8 @@ std::string oneLine(std::string_view text) {
             blank = true;
             continue;
         }
+        if (turnsDirection(c))
+            continue;
         if (blank && !line.empty())
             line += ' ';
         blank = false;

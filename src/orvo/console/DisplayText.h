@@ -21,7 +21,7 @@ namespace DisplayText {
 [[nodiscard]] std::vector<std::string> wrap(std::string_view text, std::size_t columns);
 
 /// The text in one line: control characters, which a terminal might obey, and runs of white space
-/// become one blank.
+/// become one blank; characters that override the direction of writing are left out.
 [[nodiscard]] std::string oneLine(std::string_view text);
 
 } // namespace DisplayText

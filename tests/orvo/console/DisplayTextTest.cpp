@@ -41,6 +41,7 @@ TEST(DisplayText, KeepsLineBreaksAndLongWords) {
 TEST(DisplayText, OneLineHasNoControlCharacters) {
     EXPECT_EQ(DisplayText::oneLine(" a\n\t b\x1b[31mc "), "a b [31mc");
     EXPECT_EQ(DisplayText::oneLine("a\u2028b"), "a b");
+    EXPECT_EQ(DisplayText::oneLine("R\u202E9\u2066a"), "R9a");
     EXPECT_EQ(DisplayText::oneLine(""), "");
 }
 
