@@ -19,9 +19,8 @@ ExitCode FavoritesEditCommand::run(const Arguments&, CommandContext& context) {
     if (!WindowApplication::isMade())
         return context.fail("there is no display to show a window on",
                             "Use: orvo favorites add, list, move and remove");
-    return HandOffReceiver::takeForCommand(HandOff::ofURL("orvo://?favorites=2&t=r"),
-                                           context,
-                                           HandOffReceiver::Audience::Nobody);
+    return HandOffReceiver::takeForCommand(
+        HandOff::ofURL("orvo://?favorites=2&t=r"), context, HandOffReceiver::Audience::Nobody);
 }
 
 } // namespace orvo

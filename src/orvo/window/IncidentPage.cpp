@@ -125,7 +125,7 @@ std::string IncidentPage::heading() const {
 std::string IncidentPage::shown(double now) const {
     std::string text;
     if (line) {
-        const auto shield = line->shieldText();
+        const auto shield = line->pictureText();
         addLine(text, (shield.empty() ? "" : "[" + shield + "] ") + line->title);
         addLine(text, line->detail);
         if (incidents.empty())

@@ -3,6 +3,7 @@
 #include "orvo/window/WindowTexts.h"
 #include "orvo/window/private/ShieldRow.h"
 
+#include <QGuiApplication>
 #include <QKeyEvent>
 #include <QLabel>
 #include <QScrollBar>
@@ -204,6 +205,9 @@ QLabel* IncidentView::label(const std::string& text, const QFont& font, const QC
     palette.setColor(QPalette::WindowText, color);
     label->setPalette(palette);
     label->setWordWrap(true);
+    // At its mark, whatever language a stranger wrote it in.
+    label->setAlignment(Qt::AlignAbsolute | Qt::AlignVCenter |
+                        (QGuiApplication::isRightToLeft() ? Qt::AlignRight : Qt::AlignLeft));
     label->setTextInteractionFlags(Qt::TextSelectableByMouse);
     return label;
 }

@@ -9,13 +9,13 @@ namespace orvo {
 
 namespace {
 
-std::string titleOf(const ScheduleLine& line) {
-    return DisplayText::oneLine(line.longName.empty() ? line.name() : line.longName);
+std::string textOn(const std::shared_ptr<TransitArtworkDataSource>& artwork) {
+    const auto shield = artwork ? IconManager::shieldOfArtwork(*artwork) : nullptr;
+    return DisplayText::oneLine(shield ? shield->shieldText().value_or("") : "");
 }
 
-bool hasShield(const std::shared_ptr<TransitArtworkDataSource>& artwork) {
-    const auto shield = artwork ? IconManager::shieldOfArtwork(*artwork) : nullptr;
-    return shield && !shield->shieldText().value_or("").empty();
+std::string titleOf(const ScheduleLine& line) {
+    return DisplayText::oneLine(line.longName.empty() ? line.name() : line.longName);
 }
 
 } // namespace
@@ -26,13 +26,14 @@ LineMark LineMark::ofLine(const TransitLine& line, const ScheduleStore* schedule
     mark.name = DisplayText::oneLine(line.name().value_or(""));
     mark.title = mark.name;
     mark.detail = DisplayText::oneLine(line.system() ? line.system()->name().value_or("") : "");
+    mark.systemArtwork = line.system() ? line.system()->artwork() : nullptr;
     mark.artwork = line.alternateArtwork() ? line.alternateArtwork() : line.artwork();
     if (const auto known = schedules ? schedules->line(mark.muid) : std::nullopt) {
         mark.title = titleOf(*known);
-        if (!hasShield(mark.artwork))
+        if (textOn(mark.artwork).empty())
             mark.artwork = makeTransitLine(*known)->alternateArtwork();
     }
-    if (!hasShield(mark.artwork))
+    if (textOn(mark.artwork).empty())
         mark.artwork = nullptr;
     return mark;
 }
@@ -44,8 +45,11 @@ LineMark LineMark::ofLine(const ScheduleLine& line) {
 }
 
 std::string LineMark::shieldText() const {
-    const auto shield = artwork ? IconManager::shieldOfArtwork(*artwork) : nullptr;
-    return DisplayText::oneLine(shield ? shield->shieldText().value_or("") : "");
+    return textOn(artwork);
+}
+
+std::string LineMark::pictureText() const {
+    return textOn(picture());
 }
 
 std::string LineMark::spoken() const {

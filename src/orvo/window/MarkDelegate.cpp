@@ -17,6 +17,8 @@ constexpr int Above = 9;
 constexpr int RingWidth = 2;
 constexpr double Radius = 6;
 constexpr double DetailFactor = 0.88;
+constexpr char16_t LeftToRight = 0x2066;
+constexpr char16_t EndOfDirection = 0x2069;
 
 QString textOf(const std::string& text) {
     return QString::fromStdString(text);
@@ -73,7 +75,10 @@ void MarkDelegate::paint(QPainter* painter,
     }
     const auto titleFont = WindowLooks::font(1, QFont::Medium);
     const QFontMetrics titleMetrics(titleFont);
-    const auto detail = textOf(mark.detail);
+    // Of a position, latitude stands first in every language.
+    const auto detail = mark.muid == 0 && !mark.detail.empty()
+                            ? QChar(LeftToRight) + textOf(mark.detail) + QChar(EndOfDirection)
+                            : textOf(mark.detail);
     const int height = titleMetrics.height() + (detail.isEmpty() ? 0 : detailMetrics.height());
     QRect line(inside.left(),
                inside.top() + (inside.height() - height) / 2,

@@ -117,9 +117,10 @@ QFont WindowLooks::font(double factor, QFont::Weight weight) {
 
 QPixmap WindowLooks::shield(const LineMark& mark, int size, double scale) const {
     const auto manager = IconManager::sharedManager();
-    const auto image = mark.artwork && manager
+    const auto& artwork = mark.picture();
+    const auto image = artwork && manager
                            ? manager->drawnImageForArtwork_shieldSize_scale_nightMode(
-                                 *mark.artwork, size, scale, isDark)
+                                 *artwork, size, scale, isDark)
                            : nullptr;
     if (!image)
         return {};
@@ -152,7 +153,7 @@ QString WindowLooks::styleSheet() const {
 QLineEdit, QListWidget { border: 1px solid %1; border-radius: 8px; background: %2; }
 QLineEdit { padding: 7px 8px; }
 QListWidget { padding: 4px 0; outline: 0; }
-QLineEdit:focus, QListWidget:focus { border-color: %3; }
+QLineEdit:focus { border-color: %3; }
 QPushButton { border: 1px solid %1; border-radius: 7px; padding: 5px 14px; background: %4; }
 QPushButton:focus { border-color: %3; }
 QPushButton:hover, QPushButton:pressed { background: %5; }

@@ -2,6 +2,8 @@
 
 #include "orvo/window/WindowWorld.h"
 
+#include <algorithm>
+
 namespace orvo {
 namespace {
 
@@ -25,6 +27,16 @@ TEST_F(LineMarkTest, WithoutAScheduleTheNameIsTheTitle) {
     EXPECT_EQ(mark.detail, "Metro");
     EXPECT_EQ(mark.artwork, nullptr);
     EXPECT_EQ(mark.shieldText(), "");
+}
+
+TEST_F(LineMarkTest, ALineWithoutAShieldHasItsSystemsMark) {
+    importCity();
+    const auto lines = schedules()->lines("city");
+    const auto cableCar = std::ranges::find(lines, "Skyline Cable Car", &ScheduleLine::longName);
+    ASSERT_NE(cableCar, lines.end());
+    const auto mark = LineMark::ofLine(*cableCar);
+    EXPECT_EQ(mark.shieldText(), "");
+    EXPECT_EQ(mark.pictureText(), "HHR");
 }
 
 TEST_F(LineMarkTest, AVoiceSaysNothingTwice) {

@@ -35,7 +35,8 @@ struct WindowLooks {
     /// The application's font, that many times as large.
     [[nodiscard]] static QFont font(double factor, QFont::Weight weight = QFont::Normal);
 
-    /// The line's shield for a device of that scale; null for a mark without one.
+    /// The line's shield, or else its system's mark, for a device of that scale; null for a mark
+    /// without one.
     /// @param size 0 to 7
     [[nodiscard]] QPixmap shield(const LineMark& mark, int size, double scale) const;
     /// One of the program's fixed images, `side` points wide and high.
