@@ -247,6 +247,8 @@ TEST_F(DynamicTypeWizardTest, OnlyARegisteredConstraintIsUpdated) {
     useSize(UIContentSizeCategory::AX5);
     changeSize();
     EXPECT_EQ(registered->constant(), 30);
+    Wizard::updateUnscaledConstantValue_fontProvider_forConstraint(31.2, headline, registered);
+    EXPECT_GT(registered->constant(), 90);
     Wizard::updateUnscaledConstantValue_fontProvider_forConstraint(31.2, nullptr, registered);
     EXPECT_EQ(registered->constant(), 31) << "without a provider as it is, in whole pixels";
     const auto other = heightOf(view);
