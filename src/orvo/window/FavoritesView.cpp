@@ -9,6 +9,7 @@
 #include <QLabel>
 #include <QLineEdit>
 #include <QListWidget>
+#include <QMimeData>
 #include <QPainter>
 #include <QPushButton>
 #include <QScrollBar>
@@ -60,6 +61,17 @@ QIcon magnifier(const QColor& color, double scale) {
     return pixmap;
 }
 
+/// A list whose rows are moved inside it and never copied: what travels with the pointer says only
+/// that they are rows, since no other list could read them.
+class RowsList final : public QListWidget {
+protected:
+    [[nodiscard]] QMimeData* mimeData(const QList<QListWidgetItem*>&) const override {
+        auto* const rows = new QMimeData;
+        rows->setData(model()->mimeTypes().value(0), {});
+        return rows;
+    }
+};
+
 LineMark markOf(const QListWidgetItem& item) {
     return item.data(MarkDelegate::MarkRole).value<LineMark>();
 }
@@ -105,7 +117,7 @@ void FavoritesView::makeParts() {
 }
 
 QListWidget* FavoritesView::list(MarkDelegate* delegate, const std::string& spokenName) {
-    auto* const list = new QListWidget;
+    auto* const list = new RowsList;
     list->setItemDelegate(delegate);
     list->setAccessibleName(words(spokenName));
     list->setVerticalScrollMode(QAbstractItemView::ScrollPerPixel);

@@ -194,6 +194,19 @@ class Favourites(WindowTest):
         self.keys(self.edited, "ctrl+z")
         self.are("r1", "r3", "r2")
 
+    def test_a_row_is_dragged_to_another_place(self):
+        self.orvo("favorites", "add", "city:r1", "city:r2", "city:r3")
+        self.orvo("favorites", "edit")
+        row, above = 50, 90  # the middle of the first row, and the way to the next
+        self.xdotool("mousemove", "--sync", "--window", self.edited, 150, above, "mousedown", 1)
+        for way in (0.3, 0.8, 1.4, 2.1, 2.4):  # past the middle of the last row, in steps that a hand would make
+            self.xdotool("mousemove", "--sync", "--window", self.edited, 150, above + int(way * row))
+        self.xdotool("mouseup", 1)
+        self.are("r2", "r3", "r1")
+        self.keys(self.edited, "Escape")
+        self.process.wait(PATIENCE)
+        self.assertEqual(self.process.stderr.read(), b"")
+
     def test_what_another_program_adds_is_seen_when_the_person_comes_back(self):
         self.orvo("favorites", "add", "city:r2")
         self.orvo("favorites", "edit")
