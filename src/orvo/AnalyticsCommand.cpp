@@ -16,7 +16,7 @@ namespace {
 using Session = StoredAnalyticsSession;
 using Action = StoredAnalyticsAction;
 
-constexpr std::int64_t StandardLimit = 20;
+constexpr std::int64_t StandardSessions = 20;
 
 std::optional<std::int64_t> count(const std::string& text) {
     std::int64_t value = 0;
@@ -123,22 +123,23 @@ void print(const std::vector<Session>& sessions, const CommandContext& context) 
 } // namespace
 
 CommandSpec AnalyticsCommand::spec() const {
-    return {
-        .path = {"analytics"},
-        .summary = "List what the widget recorded of its own use",
-        .description =
-            "Each time that the widget was looked at: when, for how long, what it showed, and "
-            "how that ended; the newest first. It lies in your state folder, and nothing of it "
-            "ever leaves this machine.",
-        .options = {{"limit", "N", fmt::format("how many; {} if you say nothing", StandardLimit)},
-                    {"json", "", "print JSON: times in UTC, also the single actions"}},
-        .examples = {{"orvo analytics", "the last sessions"},
-                     {"orvo analytics --limit 1000 --json", "for a script"}}};
+    return {.path = {"analytics"},
+            .summary = "List what the widget recorded of its own use",
+            .description =
+                "Each time that the widget was looked at: when, for how long, what it showed, and "
+                "how that ended; the newest first. It lies in your state folder, and nothing of it "
+                "ever leaves this machine.",
+            .options = {{"limit",
+                         "N",
+                         fmt::format("how many; {} if you say nothing", StandardSessions)},
+                        {"json", "", "print JSON: times in UTC, also the single actions"}},
+            .examples = {{"orvo analytics", "the last sessions"},
+                         {"orvo analytics --limit 1000 --json", "for a script"}}};
 }
 
 ExitCode AnalyticsCommand::run(const Arguments& arguments, CommandContext& context) {
     const auto given = arguments.value("limit");
-    const auto limit = given ? count(*given) : StandardLimit;
+    const auto limit = given ? count(*given) : StandardSessions;
     if (!limit)
         return context.wrongUsage(fmt::format("--limit cannot be {}", *given),
                                   "Write a number above 0.");

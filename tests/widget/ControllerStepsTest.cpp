@@ -167,6 +167,10 @@ TEST_F(ControllerSteps, AHostMayTellModeAndSizeBeforeTheViewIsLoaded) {
     context->mode = NCWidgetDisplayMode::Expanded;
     controller->widgetActiveDisplayModeDidChange_withMaximumSize(NCWidgetDisplayMode::Expanded, {});
     EXPECT_THAT(calls, ElementsAre("record mode 1"));
+    const auto coordinator = std::make_shared<testing::FakeCoordinator>();
+    controller->viewWillTransitionToSize_withTransitionCoordinator({320, 110}, coordinator);
+    ASSERT_TRUE(coordinator->animation);
+    coordinator->animation();
     EXPECT_FALSE(controller->isViewLoaded());
     controller->widgetPerformUpdateWithCompletionHandler(answering());
     runUntilFetched();

@@ -16,6 +16,7 @@ namespace {
 
 using testing::Calls;
 using ::testing::ElementsAre;
+using testing::FakeCoordinator;
 using ::testing::IsEmpty;
 using testing::makeItem;
 using testing::RecordingUpdater;
@@ -32,18 +33,6 @@ public:
     }
     std::shared_ptr<NSObject> openedIn;
     CompletionHandler handler;
-};
-
-/// Keeps what it is to run.
-class FakeCoordinator final : public UIViewControllerTransitionCoordinator {
-public:
-    bool animateAlongsideTransition_completion(Block block, Block end) override {
-        animation = std::move(block);
-        hasCompletion = static_cast<bool>(end);
-        return true;
-    }
-    Block animation;
-    bool hasCompletion = true;
 };
 
 class WidgetController : public testing::WidgetWorld {

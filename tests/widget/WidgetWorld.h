@@ -169,6 +169,18 @@ private:
     Calls& _calls;
 };
 
+/// Keeps what it is to run.
+class FakeCoordinator final : public UIViewControllerTransitionCoordinator {
+public:
+    bool animateAlongsideTransition_completion(Block block, Block end) override {
+        animation = std::move(block);
+        hasCompletion = static_cast<bool>(end);
+        return true;
+    }
+    Block animation;
+    bool hasCompletion = true;
+};
+
 /// A profile of its own, a lookup that answers as told, a stopped clock, and a scripted host.
 class WidgetWorld : public ::testing::Test {
 protected:

@@ -3,6 +3,7 @@
 #include "platform/feeds/alerts/ByteScan.h"
 #include "platform/foundation/SeededStringHash.h"
 
+#include <algorithm>
 #include <bit>
 
 namespace orvo {
@@ -29,9 +30,11 @@ LineTable::LineTable(const LineIndex& index)
                             line.shortName.size() + line.longName.size(),
                             line.muid});
         std::size_t slot = slotOf(line.routeId);
-        while (_slots[slot] != None)
+        std::size_t probe = 0;
+        for (; _slots[slot] != None; ++probe)
             slot = (slot + 1) % _slots.size();
         _slots[slot] = place;
+        _longestProbe = std::max(_longestProbe, probe);
     }
 }
 

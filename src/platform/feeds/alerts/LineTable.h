@@ -38,6 +38,9 @@ public:
     [[nodiscard]] Place placeOf(std::uint64_t muid) const;
     /// By the rules of `LineIndex::lineForRoute`. `None` for an unknown route.
     [[nodiscard]] Place placeOfRoute(std::string_view routeId) const;
+    /// How many slots were passed to find room for the line that lies farthest from its own: tens
+    /// at most, since nobody who writes a schedule can tell the slots of its lines.
+    [[nodiscard]] std::size_t longestProbe() const noexcept { return _longestProbe; }
 
 private:
     [[nodiscard]] std::size_t slotOf(std::string_view routeId) const noexcept;
@@ -46,6 +49,7 @@ private:
     std::string _routeIds; // of all entries, where they lie close together
     std::vector<Entry> _entries;
     std::vector<Place> _slots; // open addressing; at most half full
+    std::size_t _longestProbe = 0;
 };
 
 } // namespace orvo
