@@ -176,6 +176,9 @@ public:
     /// first.
     virtual void layoutSubviews();
     [[nodiscard]] bool needsLayout() const noexcept { return _needsLayout; }
+    /// Has the next layout pass of a view above visit this one, as for a subview that needs layout:
+    /// what its engine has to solve is solved, and what that moves is laid out.
+    void _setSubtreeNeedsLayout();
     /// Whether it is laid out by itself (a row): constraints do not reach over its edge. A view
     /// without a superview is one as well.
     [[nodiscard]] virtual bool _isLayoutRoot() const { return false; }

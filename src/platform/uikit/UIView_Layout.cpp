@@ -213,7 +213,12 @@ CGSize UIView::systemLayoutSizeFittingSize(CGSize target) {
 
 void UIView::setNeedsLayout() {
     _needsLayout = true;
-    for (auto at = superview(); at && !at->_subtreeNeedsLayout; at = at->superview())
+    if (const auto above = superview())
+        above->_setSubtreeNeedsLayout();
+}
+
+void UIView::_setSubtreeNeedsLayout() {
+    for (auto at = strong(this); at && !at->_subtreeNeedsLayout; at = at->superview())
         at->_subtreeNeedsLayout = true;
 }
 

@@ -41,10 +41,12 @@ _LayoutEngine::~_LayoutEngine() = default;
 void _LayoutEngine::structureChanged() {
     _structureDirty = true;
     _dirty = true;
+    _root._setSubtreeNeedsLayout();
 }
 
 void _LayoutEngine::constantChanged(const NSLayoutConstraint& constraint) {
     _dirty = true;
+    _root._setSubtreeNeedsLayout();
     const auto found = _installed.find(constraint._creationNumber());
     if (found != _installed.end())
         std::ignore =

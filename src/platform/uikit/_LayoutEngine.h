@@ -25,8 +25,10 @@ public:
     _LayoutEngine& operator=(const _LayoutEngine&) = delete;
     ~_LayoutEngine();
 
-    /// Views, guides, constraints, priorities or directions are not what they were.
+    /// Views, guides, constraints, priorities or directions are not what they were. The next layout
+    /// pass from above comes to the root.
     void structureChanged();
+    /// Likewise.
     void constantChanged(const NSLayoutConstraint& constraint);
     /// What the content of a view asks for, or where its baselines lie, is not what it was.
     void contentChanged(const UIView& view);
