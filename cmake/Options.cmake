@@ -16,6 +16,9 @@ if(CMAKE_CXX_COMPILER_ID STREQUAL "GNU" AND NOT ORVO_FUZZERS)
   endif()
 endif()
 
+# Each library that is loaded costs every start its relocations: only those that a program calls.
+add_link_options(LINKER:--as-needed)
+
 set(CMAKE_CXX_STANDARD 20)
 set(CMAKE_CXX_STANDARD_REQUIRED ON)
 set(CMAKE_CXX_EXTENSIONS OFF)

@@ -2,25 +2,27 @@
 
 #include "platform/feeds/schedule/ScheduleError.h"
 #include "platform/feeds/schedule/ScheduleText.h"
+#include "platform/feeds/schedule/private/ZipLibrary.h"
 
 #include <array>
 #include <fmt/format.h>
 #include <fstream>
 #include <utility>
-#include <zip.h>
 
 namespace orvo {
 
 struct ZipScheduleArchive::Zip {
+    const ZipLibrary& library;
     zip_t* handle = nullptr;
     std::shared_ptr<NSData> bytes;
 
-    Zip() = default;
+    explicit Zip(const ZipLibrary& openedLibrary)
+        : library(openedLibrary) {}
     Zip(const Zip&) = delete;
     Zip& operator=(const Zip&) = delete;
     ~Zip() {
         if (handle)
-            zip_discard(handle);
+            library.discard(handle);
     }
 };
 
@@ -29,38 +31,44 @@ namespace {
 /// The library's error, as text.
 class ZipError {
 public:
-    ZipError() { zip_error_init(&_error); }
+    explicit ZipError(const ZipLibrary& library)
+        : _library(library) {
+        _library.errorInit(&_error);
+    }
     ZipError(const ZipError&) = delete;
     ZipError& operator=(const ZipError&) = delete;
-    ~ZipError() { zip_error_fini(&_error); }
+    ~ZipError() { _library.errorFini(&_error); }
 
     zip_error_t* get() { return &_error; }
-    bool isNoArchive() const { return zip_error_code_zip(&_error) == ZIP_ER_NOZIP; }
-    std::string text() { return zip_error_strerror(&_error); }
+    bool isNoArchive() const { return _library.errorCodeZip(&_error) == ZIP_ER_NOZIP; }
+    std::string text() { return _library.errorText(&_error); }
 
 private:
+    const ZipLibrary& _library;
     zip_error_t _error;
 };
 
 class ZipStream final : public ScheduleStream {
 public:
-    ZipStream(zip_file_t* file, std::string name)
-        : _file(file)
+    ZipStream(const ZipLibrary& library, zip_file_t* file, std::string name)
+        : _library(library)
+        , _file(file)
         , _name(std::move(name)) {}
-    ~ZipStream() override { zip_fclose(_file); }
+    ~ZipStream() override { _library.closeFile(_file); }
 
     std::size_t read(std::span<char> buffer, std::shared_ptr<NSError>& error) override {
-        const zip_int64_t read = zip_fread(_file, buffer.data(), buffer.size());
+        const zip_int64_t read = _library.read(_file, buffer.data(), buffer.size());
         if (read >= 0)
             return static_cast<std::size_t>(read);
         error = scheduleError(ScheduleErrorCode::CannotRead,
                               fmt::format("{}: cannot be inflated: {}",
                                           _name,
-                                          zip_error_strerror(zip_file_get_error(_file))));
+                                          _library.errorText(_library.fileError(_file))));
         return 0;
     }
 
 private:
+    const ZipLibrary& _library;
     zip_file_t* _file;
     std::string _name;
 };
@@ -91,28 +99,27 @@ std::string whatItIs(std::string_view head) {
                        ScheduleText::cleanName(head.substr(0, 20)));
 }
 
-zip_t* openZip(const ScheduleSource& source, ZipError& failure) {
+zip_t* openZip(const ZipLibrary& library, const ScheduleSource& source, ZipError& failure) {
     zip_source_t* input =
         source.bytes()
-            ? zip_source_buffer_create(
+            ? library.bufferSource(
                   source.bytes()->bytes().data(), source.bytes()->length(), 0, failure.get())
-            : zip_source_file_create(source.path().c_str(), 0, 0, failure.get());
+            : library.fileSource(source.path().c_str(), 0, 0, failure.get());
     if (!input)
         return nullptr;
-    zip_t* zip = zip_open_from_source(input, ZIP_RDONLY, failure.get());
+    zip_t* zip = library.open(input, ZIP_RDONLY, failure.get());
     if (!zip)
-        zip_source_free(input);
+        library.freeSource(input);
     return zip;
 }
 
-std::vector<ArchiveEntry> listEntries(zip_t* zip) {
+std::vector<ArchiveEntry> listEntries(const ZipLibrary& library, zip_t* zip) {
     std::vector<ArchiveEntry> entries;
-    const zip_int64_t count = zip_get_num_entries(zip, 0);
+    const zip_int64_t count = library.entryCount(zip, 0);
     for (zip_int64_t index = 0; index < count; ++index) {
-        zip_stat_t stat;
-        zip_stat_init(&stat);
+        zip_stat_t stat{};
         const auto number = static_cast<zip_uint64_t>(index);
-        if (zip_stat_index(zip, number, ZIP_FL_ENC_GUESS, &stat) != 0 || !stat.name)
+        if (library.statistics(zip, number, ZIP_FL_ENC_GUESS, &stat) != 0 || !stat.name)
             continue;
         const bool hasSize = (stat.valid & ZIP_STAT_SIZE) != 0;
         entries.push_back({stat.name, number, hasSize ? stat.size : 0});
@@ -131,13 +138,20 @@ ZipScheduleArchive::ZipScheduleArchive(ArchiveLayout layout,
 
 std::unique_ptr<ScheduleArchive> ZipScheduleArchive::open(const ScheduleSource& source,
                                                           std::shared_ptr<NSError>& error) {
-    ZipError failure;
-    const auto zip = std::make_shared<Zip>();
+    std::string reason;
+    const auto* const library = ZipLibrary::shared(reason);
+    if (!library) {
+        error = scheduleError(ScheduleErrorCode::CannotRead,
+                              source.name() + ": no zip file can be read: " + reason);
+        return nullptr;
+    }
+    ZipError failure(*library);
+    const auto zip = std::make_shared<Zip>(*library);
     zip->bytes = source.bytes();
-    zip->handle = openZip(source, failure);
+    zip->handle = openZip(*library, source, failure);
     std::vector<ArchiveEntry> entries;
     if (zip->handle)
-        entries = listEntries(zip->handle);
+        entries = listEntries(*library, zip->handle);
     // The library takes a file without any bytes for an archive without any files.
     if (entries.empty()) {
         const bool isReadable = zip->handle || failure.isNoArchive();
@@ -157,15 +171,16 @@ std::unique_ptr<ScheduleArchive> ZipScheduleArchive::open(const ScheduleSource& 
 std::unique_ptr<ScheduleStream>
 ZipScheduleArchive::openFile(std::string_view file, std::shared_ptr<NSError>& error) const {
     const std::string name = fmt::format("{}: {}", _name, file);
-    zip_file_t* opened = zip_fopen_index(_zip->handle, layout().entry(file)->number, 0);
+    const auto& library = _zip->library;
+    zip_file_t* opened = library.openFile(_zip->handle, layout().entry(file)->number, 0);
     if (!opened) {
         error = scheduleError(ScheduleErrorCode::CannotRead,
                               fmt::format("{}: cannot be opened: {}",
                                           name,
-                                          zip_error_strerror(zip_get_error(_zip->handle))));
+                                          library.errorText(library.archiveError(_zip->handle))));
         return nullptr;
     }
-    return std::make_unique<ZipStream>(opened, name);
+    return std::make_unique<ZipStream>(library, opened, name);
 }
 
 } // namespace orvo
