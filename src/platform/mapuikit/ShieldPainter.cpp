@@ -1,9 +1,9 @@
 #include "platform/mapuikit/ShieldPainter.h"
 
 #include "platform/geoservices/TransitArtworkTypes.h"
+#include "platform/uikit/text/private/ToolkitFonts.h"
 
 #include <QFont>
-#include <QFontDatabase>
 #include <QGuiApplication>
 #include <QImage>
 #include <QPainter>
@@ -73,17 +73,7 @@ Colours coloursOf(const TransitShieldDataSource& shield, bool nightMode) {
 }
 
 QFont shieldFont() {
-    static const QString family = [] {
-        const int identifier =
-            QFontDatabase::addApplicationFont("/usr/share/fonts/opentype/inter/Inter-SemiBold.otf");
-        const auto families = QFontDatabase::applicationFontFamilies(identifier);
-        return families.isEmpty() ? QString() : families.first();
-    }();
-    QFont font(family);
-    font.setPixelSize(LayoutPixels);
-    font.setWeight(QFont::DemiBold);
-    font.setHintingPreference(QFont::PreferNoHinting);
-    return font;
+    return ToolkitFonts::fontOf({.pointSize = LayoutPixels, .weight = QFont::DemiBold});
 }
 
 /// The text as a shape whose capitals stand `capHeight`-centred around y = 0, from x = 0.

@@ -22,15 +22,20 @@ constexpr std::array Faces{Face{400, "/usr/share/fonts/opentype/inter/Inter-Regu
                            Face{600, "/usr/share/fonts/opentype/inter/Inter-SemiBold.otf"},
                            Face{700, "/usr/share/fonts/opentype/inter/Inter-Bold.otf"}};
 
-/// Loaded when first used: a widget needs two of the four.
-QString familyOf(std::size_t face) {
-    static std::array<QString, Faces.size()> families;
-    auto& family = families.at(face);
-    if (family.isNull()) {
-        const int identifier = QFontDatabase::addApplicationFont(Faces.at(face).path);
-        family = QFontDatabase::applicationFontFamilies(identifier).value(0, "");
-    }
-    return family;
+/// All are loaded when one is first used: whenever a face is added, the toolkit forgets every font
+/// that it has opened, and opens it again beside the one that a text still holds.
+std::array<QString, Faces.size()> loadedFamilies() {
+    std::array<QString, Faces.size()> families;
+    std::ranges::transform(Faces, families.begin(), [](const Face& face) {
+        const int identifier = QFontDatabase::addApplicationFont(face.path);
+        return QFontDatabase::applicationFontFamilies(identifier).value(0, "");
+    });
+    return families;
+}
+
+const QString& familyOf(std::size_t face) {
+    static const auto families = loadedFamilies();
+    return families.at(face);
 }
 
 std::size_t nearestFace(int weight) {

@@ -3,6 +3,7 @@
 #include "platform/uikit/text/TextLayout.h"
 #include "support/GraphicalApplication.h"
 
+#include <QGuiApplication>
 #include <gtest/gtest.h>
 
 #include <numeric>
@@ -67,6 +68,17 @@ TEST_F(FontTest, BoldIsWider) {
     };
     EXPECT_GT(width(700), width(600));
     EXPECT_GT(width(600), width(400));
+}
+
+TEST_F(FontTest, AnotherWeightIsThereWithoutTheOpenFontsBeingForgotten) {
+    int changes = 0;
+    const auto* const application = qobject_cast<QGuiApplication*>(QCoreApplication::instance());
+    const auto watch = QObject::connect(
+        application, &QGuiApplication::fontDatabaseChanged, application, [&] { ++changes; });
+    for (const int weight : {400, 500, 600, 700})
+        EXPECT_GT(advancesOf("W", {0}, {.pointSize = 17, .weight = weight})[0], 0);
+    QObject::disconnect(watch);
+    EXPECT_EQ(changes, 0);
 }
 
 TEST_F(FontTest, BothDirectionsInOneTextAddUpToItsWidth) {
