@@ -34,6 +34,9 @@ inline bool haveWindowApplication() {
 /// A profile of its own, a clock that stands still, English texts.
 class WindowTest : public ::testing::Test {
 protected:
+    /// A fixture may have windows among its members: they come after this.
+    WindowTest() { haveWindowApplication(); }
+
     static constexpr double Now = 1750000000; // 2025-06-15T15:06:40Z
 
     /// The demonstration city's schedule as the feed `city`.
