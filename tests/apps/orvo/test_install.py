@@ -27,6 +27,8 @@ EXPECTED = (
     "share/fish/vendor_completions.d/orvo-transit-widget.fish",
     "share/orvo-transit-widget/en.lproj/Localizable.strings",
     "share/orvo-transit-widget/ar.lproj/Localizable.strings",
+    "share/orvo-transit-widget/en.lproj/Windows.strings",
+    "share/orvo-transit-widget/ar.lproj/Windows.strings",
     "lib/orvo-transit-widget/System/Library/PrivateFrameworks/Lockbox.framework/Lockbox",
 )
 

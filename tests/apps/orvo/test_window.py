@@ -7,6 +7,7 @@ import subprocess
 import time
 import unittest
 
+from assistive import AssistiveTools
 from handing import INTERFACE, NAME, PATH, PATIENCE, BusTest, incident, line, tap_on_incidents, tap_on_line
 from support import feed
 
@@ -212,6 +213,68 @@ class Favourites(WindowTest):
         self.orvo("favorites", "edit")
         self.keys(self.edited, "Down", "Delete")
         self.are()
+
+
+class Voices(AssistiveTools, WindowTest):
+    """What a person hears who does not see the windows."""
+
+    activates = False
+
+    @classmethod
+    def setUpClass(cls):
+        super().setUpClass()
+        cls.find_tools()
+
+    def names(self, process, role):
+        """Of the elements of that role that are shown, and have one."""
+        try:
+            return [part.title for part in self.parts_of(process, role) if part.is_showing and part.title]
+        except self.dbus.DBusException:
+            return None  # one went while it was asked
+
+    def rows(self, process, title):
+        """Of the list of that name."""
+        try:
+            (found,) = [part for part in self.parts_of(process, "list") if part.title == title]
+            return [row.title for row in found.children]
+        except self.dbus.DBusException:
+            return None
+
+    def hears(self, process, role, *names):
+        def look():
+            self.heard = self.names(process, role)
+            return self.heard == list(names)
+        try:
+            self.eventually(look, f"each {role} is one of {names}")
+        except AssertionError as error:
+            raise AssertionError(f"{error}; they are {self.heard}") from None
+
+    def test_the_search_field_the_lists_and_their_buttons_have_names(self):
+        self.orvo("feeds", "add", "city", "--static", self.schedule(), "--alerts", self.write("alerts.pb", feed(1)))
+        self.orvo("favorites", "add", "city:r1", "city:r2")
+        process = self.start("favorites", "edit")
+        window = self.window("Favorite lines")
+        self.hears(process, "list", "Favorites")
+        self.hears(process, "text", "Add a line: search by name or number")
+        self.hears(process, "push button", "Move Up", "Move Down", "Remove")
+        known = ["1, First Street, Test Transit", "2, Second Street, Test Transit"]
+        found = "Harbour Ferry, Test Transit"
+        self.assertEqual(self.rows(process, "Favorites"), known)
+        self.write_text(window, "ferry")
+        self.hears(process, "list", "Lines found")
+        self.assertEqual(self.rows(process, "Lines found"), [found])
+        self.keys(window, "Return")
+        self.eventually(lambda: self.rows(process, "Favorites") == [*known, found], "the line that was found is among them")
+        self.keys(window, "Down", "Delete")
+        self.hears(process, "push button", "Move Up", "Move Down", "Remove", "Undo")
+
+    def test_incidents_and_their_links_are_read_out(self):
+        process = self.start("receive", "ContinueUserActivity", stdin=subprocess.PIPE)
+        process.stdin.write(tap_on_line(line("U1", incident("Works", description="No trains.", feed="city", link="https://t.example/i"))))
+        process.stdin.close()
+        self.window("U1 · Metro")
+        self.hears(process, "label", "U1", "Metro", "Works", "Until further notice", "No trains.",
+                   "More information: t.example")
 
 
 if __name__ == "__main__":

@@ -13,16 +13,12 @@ import threading
 import time
 import unittest
 
+from assistive import PROPERTIES, SERVICE, AssistiveTools
 from handing import NAME, BusTest
 from support import feed
 from widget_support import NOW, WIDGET, WidgetTest, alert, period, selector, text
 
 PATIENCE = float(os.environ.get("ORVO_TEST_PATIENCE", "90"))  # seconds, for machines that do much besides
-ACCESSIBLE = "org.a11y.atspi.Accessible"
-PROPERTIES = "org.freedesktop.DBus.Properties"
-REGISTRY = ("org.a11y.atspi.Registry", "/org/a11y/atspi/accessible/root")
-BUS_LAUNCHERS = ("/usr/libexec/at-spi-bus-launcher", "/usr/lib/at-spi2-core/at-spi-bus-launcher")
-SERVICE = "[D-BUS Service]\nName={}\nExec={}\n"
 CARD_WIDTH, COMPACT_HEIGHT = 359, 146
 
 
@@ -70,64 +66,7 @@ class AlertHandler(http.server.BaseHTTPRequestHandler):
         pass
 
 
-class Part:
-    """An element that assistive tools are told of."""
-
-    def __init__(self, connection, name, path):
-        self._connection, self._name, self._path = connection, name, path
-
-    def _call(self, interface, method, *arguments):
-        proxy = self._connection.get_object(self._name, self._path, introspect=False)
-        return proxy.get_dbus_method(method, interface)(*arguments)
-
-    @property
-    def title(self):
-        return str(self._call(PROPERTIES, "Get", ACCESSIBLE, "Name"))
-
-    @property
-    def role(self):
-        return str(self._call(ACCESSIBLE, "GetRoleName"))
-
-    @property
-    def children(self):
-        return [Part(self._connection, *reference) for reference in self._call(ACCESSIBLE, "GetChildren")]
-
-    @property
-    def process(self):
-        bus = self._connection.get_object("org.freedesktop.DBus", "/org/freedesktop/DBus", introspect=False)
-        return int(bus.GetConnectionUnixProcessID(self._name, dbus_interface="org.freedesktop.DBus"))
-
-    @property
-    def states(self):
-        low, high = self._call(ACCESSIBLE, "GetState")
-        return int(low) | int(high) << 32
-
-    @property
-    def is_focused(self):
-        return bool(self.states >> 12 & 1)  # ATSPI_STATE_FOCUSED
-
-    @property
-    def actions(self):
-        return [str(name) for name, *_ in self._call("org.a11y.atspi.Action", "GetActions")]
-
-    @property
-    def middle(self):
-        x, y, width, height = map(int, self._call("org.a11y.atspi.Component", "GetExtents", 0))
-        return x + width // 2, y + height // 2
-
-    def press(self):
-        self._call("org.a11y.atspi.Action", "DoAction", 0)
-
-
-def parts_of(root):
-    """The element and all below it."""
-    found = [root]
-    for child in root.children:
-        found += parts_of(child)
-    return found
-
-
-class WindowTest(BusTest, WidgetTest):
+class WindowTest(AssistiveTools, BusTest, WidgetTest):
     """The widget in a window of a display that nobody looks at, beside a session bus with assistive tools."""
 
     @classmethod
@@ -135,14 +74,7 @@ class WindowTest(BusTest, WidgetTest):
         for program in ("Xvfb", "xdotool", "dbus-daemon"):
             if not shutil.which(program):
                 raise unittest.SkipTest(f"there is no {program}")
-        cls.launcher = next((path for path in BUS_LAUNCHERS if os.path.exists(path)), None)
-        if not cls.launcher:
-            raise unittest.SkipTest("there is no at-spi-bus-launcher (at-spi2-core)")
-        try:
-            import dbus
-        except ImportError as error:
-            raise unittest.SkipTest("there is no python3-dbus") from error
-        cls.dbus = dbus
+        cls.find_tools()
         cls.start_display()
 
     @classmethod
@@ -167,17 +99,10 @@ class WindowTest(BusTest, WidgetTest):
         # The bus starts services without a display: none of them shows anything here.
         for name in ("QT_QPA_PLATFORM", "DISPLAY", "WAYLAND_DISPLAY"):
             self.environment.pop(name, None)
-        self.environment["GSETTINGS_BACKEND"] = "memory"  # else what is switched on is asked of a service that is not there
         services = self.home / "services"
         services.mkdir()
         self.write_service(services, f'"{os.environ["ORVO_PROGRAM"]}" service --idle 600')
-        (services / "org.a11y.Bus.service").write_text(SERVICE.format("org.a11y.Bus", self.launcher))
         self.bus_with(f"<servicedir>{services}</servicedir>")
-        self.session = self.connect(self.environment["DBUS_SESSION_BUS_ADDRESS"])
-        tools = self.session.get_object("org.a11y.Bus", "/org/a11y/bus", introspect=False)
-        for switch in ("IsEnabled", "ScreenReaderEnabled"):
-            tools.Set("org.a11y.Status", switch, self.dbus.Boolean(True, variant_level=1), dbus_interface=PROPERTIES)
-        self.tools = self.connect(str(tools.GetAddress(dbus_interface="org.a11y.Bus")))
         self.environment["DBUS_SYSTEM_BUS_ADDRESS"] = "disabled:"
 
     def system_bus(self):
@@ -188,11 +113,6 @@ class WindowTest(BusTest, WidgetTest):
         self.addCleanup(self.end, bus)
         self.environment["DBUS_SYSTEM_BUS_ADDRESS"] = bus.stdout.readline().decode().strip()
         return self.environment["DBUS_SYSTEM_BUS_ADDRESS"]
-
-    def connect(self, address):
-        connection = self.dbus.bus.BusConnection(address)
-        self.addCleanup(connection.close)
-        return connection
 
     def live_feed(self, *alerts):
         """The person's own feed, whose alerts come from a server that tells these first."""
@@ -257,9 +177,7 @@ class WindowTest(BusTest, WidgetTest):
 
     def parts(self, role):
         """Its elements of that role."""
-        root = Part(self.tools, *REGISTRY)
-        own = [child for child in root.children if child.process == self.process.pid]
-        return [part for application in own for part in parts_of(application) if part.role == role]
+        return self.parts_of(self.process, role)
 
     def rows(self):
         """The spoken titles of its rows."""
