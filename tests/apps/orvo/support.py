@@ -38,6 +38,9 @@ class ProgramTest(unittest.TestCase):
             self.environment[f"XDG_{name}_HOME"] = str(self.home / below)
         self.environment["HOME"] = str(self.home)
         self.environment.pop("ORVO_NOW", None)
+        if "ASAN_OPTIONS" in self.environment:
+            # The display's keyboard library copies texts out of the middle of others, which strict checks refuse.
+            self.environment["ASAN_OPTIONS"] += ":strict_string_checks=0"
 
     def command(self, *words):
         return [PROGRAM, *map(str, words)]
