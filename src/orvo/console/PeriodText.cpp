@@ -6,6 +6,7 @@
 #include <unicode/dtptngen.h>
 #include <unicode/smpdtfmt.h>
 
+#include <algorithm>
 #include <cmath>
 #include <fmt/format.h>
 #include <memory>
@@ -39,6 +40,17 @@ std::pair<int, int> dayOf(double time, const icu::TimeZone& zone) {
     const std::unique_ptr<icu::Calendar> calendar(icu::Calendar::createInstance(zone, status));
     calendar->setTime(time * Millisecond, status);
     return {calendar->get(UCAL_EXTENDED_YEAR, status), calendar->get(UCAL_DAY_OF_YEAR, status)};
+}
+
+/// The first moment of the day after that of `time`, in the zone.
+double dayAfter(double time, const icu::TimeZone& zone) {
+    UErrorCode status = U_ZERO_ERROR;
+    const std::unique_ptr<icu::Calendar> calendar(icu::Calendar::createInstance(zone, status));
+    calendar->setTime(time * Millisecond, status);
+    calendar->add(UCAL_DATE, 1, status);
+    for (const auto field : {UCAL_HOUR_OF_DAY, UCAL_MINUTE, UCAL_SECOND, UCAL_MILLISECOND})
+        calendar->set(field, 0);
+    return calendar->getTime(status) / Millisecond;
 }
 
 } // namespace
@@ -80,6 +92,16 @@ std::string period(std::optional<double> start,
     if (start)
         return fmt::format("since {}", at(*start));
     return end ? fmt::format("until {}", at(*end)) : "until further notice";
+}
+
+std::optional<double> nextChange(std::optional<double> start,
+                                 std::optional<double> end,
+                                 double now,
+                                 const std::optional<std::string>& timeZone) {
+    if (!start && !end)
+        return std::nullopt;
+    const double midnight = dayAfter(now, *zoneNamed(timeZone));
+    return start && *start > now ? std::min(*start, midnight) : midnight;
 }
 
 std::string age(double seconds) {

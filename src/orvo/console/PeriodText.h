@@ -19,6 +19,14 @@ namespace PeriodText {
                                  double now,
                                  const std::optional<std::string>& timeZone);
 
+/// When the words of a period next change while nothing but time goes by, in seconds since 1970 and
+/// later than `now`: when it begins, and at midnight in the zone, which says anew how much of a
+/// date need be said. Nothing for a period that is open on both sides.
+[[nodiscard]] std::optional<double> nextChange(std::optional<double> start,
+                                               std::optional<double> end,
+                                               double now,
+                                               const std::optional<std::string>& timeZone);
+
 /// A moment as in the periods: `16:45` on the day of `now`, else `9 Jun, 16:45`, with the year
 /// where it is another one.
 [[nodiscard]] std::string

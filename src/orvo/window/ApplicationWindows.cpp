@@ -2,7 +2,6 @@
 
 #include "orvo/window/private/FavoritesView.h"
 #include "orvo/window/private/IncidentView.h"
-#include "platform/foundation/NSDate.h"
 #include "platform/foundation/Text.h"
 #include "platform/settings/DesktopSettings.h"
 
@@ -64,7 +63,7 @@ struct ApplicationWindows::Private {
         looks = WindowLooks::of(appearance);
         looks.applyToApplication();
         if (page)
-            incidents.show(*page, NSDate::date()->timeIntervalSince1970(), looks);
+            incidents.show(*page, looks);
         favorites.setLooks(looks);
     }
 
@@ -93,7 +92,7 @@ ApplicationWindows::~ApplicationWindows() = default;
 
 void ApplicationWindows::show(const IncidentPage& page, const std::string& activationToken) {
     _private->page = page;
-    _private->incidents.show(page, NSDate::date()->timeIntervalSince1970(), _private->looks);
+    _private->incidents.show(page, _private->looks);
     if (!_private->incidents.isVisible())
         _private->incidents.resize(_private->incidents.sizeHint());
     bringToFront(_private->incidents, activationToken);

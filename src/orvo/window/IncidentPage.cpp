@@ -1,6 +1,7 @@
 #include "orvo/window/IncidentPage.h"
 
 #include "orvo/console/DisplayText.h"
+#include "orvo/console/PeriodText.h"
 #include "orvo/window/WindowTexts.h"
 #include "platform/feeds/schedule/ScheduleStore.h"
 #include "platform/foundation/NSArray.h"
@@ -80,6 +81,10 @@ std::string shieldsIn(const IncidentPage::Incident& incident) {
 
 std::string IncidentPage::Incident::period(double now) const {
     return isUnknown ? std::string() : WindowTexts::period(start, end, now, timeZone);
+}
+
+std::optional<double> IncidentPage::Incident::nextPeriodChange(double now) const {
+    return isUnknown ? std::nullopt : PeriodText::nextChange(start, end, now, timeZone);
 }
 
 std::vector<std::string> IncidentPage::Incident::paragraphs() const {

@@ -36,6 +36,8 @@ struct IncidentPage {
         /// The period in words, with the clock of the agency's place. Empty for a status that is
         /// unknown.
         [[nodiscard]] std::string period(double now) const;
+        /// When those words next change, later than `now`; nothing where they do not.
+        [[nodiscard]] std::optional<double> nextPeriodChange(double now) const;
         /// The paragraphs of `text`, each one line; none is empty.
         [[nodiscard]] std::vector<std::string> paragraphs() const;
         /// Whether the link is one of the web: another kind is shown and not followed.

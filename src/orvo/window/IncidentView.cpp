@@ -2,6 +2,8 @@
 
 #include "orvo/window/WindowTexts.h"
 #include "orvo/window/private/ShieldRow.h"
+#include "platform/foundation/NSDate.h"
+#include "platform/foundation/NSTimer.h"
 
 #include <QGuiApplication>
 #include <QKeyEvent>
@@ -53,8 +55,13 @@ IncidentView::IncidentView(LinkOpener opener)
     setHorizontalScrollBarPolicy(Qt::ScrollBarAlwaysOff);
 }
 
-void IncidentView::show(const IncidentPage& page, double now, const WindowLooks& looks) {
+IncidentView::~IncidentView() {
+    stopFollowingTime();
+}
+
+void IncidentView::show(const IncidentPage& page, const WindowLooks& looks) {
     _looks = looks;
+    _periods.clear();
     auto* const content = new QWidget;
     auto* const rows = column(0);
     rows->setContentsMargins(Margin, Margin - 4, Margin, Margin);
@@ -68,7 +75,7 @@ void IncidentView::show(const IncidentPage& page, double now, const WindowLooks&
     for (const auto& one : page.incidents) {
         rows->addWidget(separator());
         rows->addSpacing(16);
-        rows->addWidget(incident(one, now));
+        rows->addWidget(incident(one));
         rows->addSpacing(20);
     }
     rows->addStretch(1);
@@ -82,6 +89,7 @@ void IncidentView::show(const IncidentPage& page, double now, const WindowLooks&
     setWidget(content); // which takes the earlier one's place
     setWindowTitle(qt(page.heading()));
     verticalScrollBar()->setValue(0);
+    followTime();
 }
 
 QSize IncidentView::sizeHint() const {
@@ -95,6 +103,36 @@ void IncidentView::keyPressEvent(QKeyEvent* event) {
         window()->close();
     else
         QScrollArea::keyPressEvent(event);
+}
+
+void IncidentView::showEvent(QShowEvent* event) {
+    QScrollArea::showEvent(event);
+    followTime();
+}
+
+void IncidentView::hideEvent(QHideEvent* event) {
+    stopFollowingTime();
+    QScrollArea::hideEvent(event);
+}
+
+void IncidentView::followTime() {
+    stopFollowingTime();
+    const double now = NSDate::date()->timeIntervalSince1970();
+    std::optional<double> next;
+    for (const auto& [label, incident] : _periods) {
+        label->setText(qt(incident.period(now)));
+        const auto change = incident.nextPeriodChange(now);
+        if (change && (!next || *change < *next))
+            next = change;
+    }
+    if (next && isVisible())
+        _nextWords = NSTimer::scheduledTimerWithTimeInterval_repeats_block(
+            *next - now, false, [this](const auto&) { followTime(); });
+}
+
+void IncidentView::stopFollowingTime() {
+    if (const auto timer = std::exchange(_nextWords, nullptr))
+        timer->invalidate();
 }
 
 QWidget* IncidentView::heading(const IncidentPage& page) const {
@@ -130,14 +168,16 @@ QWidget* IncidentView::goodService() const {
     return marked("good-v2", _looks.good, TitleFactor, texts);
 }
 
-QWidget* IncidentView::incident(const IncidentPage::Incident& incident, double now) const {
+QWidget* IncidentView::incident(const IncidentPage::Incident& incident) {
     const auto color = incident.isUnknown ? _looks.secondary : _looks.advisory;
     auto* const texts = column(0);
     texts->addWidget(
         label(incident.title, WindowLooks::font(TitleFactor, QFont::DemiBold), _looks.text));
-    if (const auto period = incident.period(now); !period.empty()) {
+    if (!incident.isUnknown) {
+        auto* const period = label("", WindowLooks::font(SmallFactor), _looks.secondary);
         texts->addSpacing(3);
-        texts->addWidget(label(period, WindowLooks::font(SmallFactor), _looks.secondary));
+        texts->addWidget(period);
+        _periods.emplace_back(period, incident);
     }
     if (!incident.lines.empty()) {
         const auto others =

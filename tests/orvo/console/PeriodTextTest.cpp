@@ -55,6 +55,28 @@ TEST_F(PeriodTextTest, NamesTheDayAndTheYearOnlyWhereTheyDiffer) {
     EXPECT_EQ(period({}, at("2024-07-24T22:30:00Z")), "until 25. Juli, 00:30");
 }
 
+TEST_F(PeriodTextTest, WordsChangeWhenItBeginsAndAtMidnightOfThePlace) {
+    const auto change = [&](std::optional<double> start, std::optional<double> end) {
+        return PeriodText::nextChange(start, end, now, "Europe/Berlin");
+    };
+    const double midnight = at("2024-07-24T22:00:00Z");
+    EXPECT_EQ(change(now + 60, now + 120), now + 60);
+    EXPECT_EQ(change(now, now + 120), midnight);
+    EXPECT_EQ(change({}, now + 120), midnight);
+    EXPECT_EQ(change(midnight + 60, {}), midnight);
+    EXPECT_EQ(change({}, {}), std::nullopt);
+    now = midnight;
+    EXPECT_EQ(change(now - 60, {}), midnight + 86400);
+}
+
+TEST_F(PeriodTextTest, ADayIsAsLongAsItIsThere) {
+    const auto midnightAfter = [](const char* time) {
+        return PeriodText::nextChange(std::nullopt, 0, at(time), "Europe/Berlin");
+    };
+    EXPECT_EQ(midnightAfter("2024-03-30T23:30:00Z"), at("2024-03-31T22:00:00Z"));
+    EXPECT_EQ(midnightAfter("2024-10-26T22:30:00Z"), at("2024-10-27T23:00:00Z"));
+}
+
 TEST_F(PeriodTextTest, AgesAreTheLargestWholeUnit) {
     EXPECT_EQ(PeriodText::age(59), "less than a minute");
     EXPECT_EQ(PeriodText::age(60), "1 minute");

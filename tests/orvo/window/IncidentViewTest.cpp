@@ -1,6 +1,7 @@
 #include "orvo/window/private/IncidentView.h"
 
 #include "orvo/window/WindowWorld.h"
+#include "platform/foundation/RunLoop.h"
 
 #include <QKeyEvent>
 #include <QLabel>
@@ -15,7 +16,7 @@ protected:
     void SetUp() override { ASSERT_TRUE(testing::haveWindowApplication()); }
 
     void show(const IncidentPage& page) {
-        view.show(page, Now, WindowLooks::of({}));
+        view.show(page, WindowLooks::of({}));
         view.resize(view.sizeHint());
         view.QWidget::show();
         QCoreApplication::processEvents();
@@ -35,6 +36,11 @@ protected:
             text += document.toPlainText().toStdString() + "\n";
         }
         return text;
+    }
+
+    void turnClock(double seconds) const {
+        clock->advance(seconds);
+        RunLoop::main().checkTimers();
     }
 
     std::string opened;
@@ -118,6 +124,40 @@ TEST_F(IncidentViewTest, EscapeClosesTheWindow) {
     QKeyEvent key(QEvent::KeyPress, Qt::Key_Escape, Qt::NoModifier);
     QCoreApplication::sendEvent(&view, &key);
     EXPECT_FALSE(view.isVisible());
+}
+
+TEST_F(IncidentViewTest, WordsOfAPeriodFollowTheClockWhileTheyAreSeen) {
+    show(pageOfIncidents({FeedTransitIncident::initWithFields_details(
+        {.startDate = NSDate::dateWithTimeIntervalSince1970(Now + 60),
+         .endDate = NSDate::dateWithTimeIntervalSince1970(Now + 36000),
+         .title = "Works"},
+        {.timeZone = "Europe/Berlin"})}));
+    const auto says = [this](const char* words) {
+        return read() == std::string("1 incident\nWorks\n") + words + "\n";
+    };
+    EXPECT_TRUE(says("5:07 PM – Jun 16, 3:06 AM")) << read();
+    turnClock(61);
+    EXPECT_TRUE(says("Since 5:07 PM, until Jun 16, 3:06 AM")) << read();
+    turnClock(7 * 3600);
+    EXPECT_TRUE(says("Since Jun 15, 5:07 PM, until 3:06 AM")) << read();
+    EXPECT_EQ(RunLoop::main().scheduledTimers(), 1U); // for the next midnight
+}
+
+TEST_F(IncidentViewTest, NobodyIsWokenForWordsThatAreNotSeen) {
+    show(pageOfLine({testing::feedIncident(1, "Works")}));
+    EXPECT_EQ(RunLoop::main().scheduledTimers(), 1U);
+    view.close();
+    EXPECT_EQ(RunLoop::main().scheduledTimers(), 0U);
+    turnClock(86400);
+    view.QWidget::show();
+    EXPECT_NE(read().find("Since Jun 15, 11:36 PM, until Jun 16, 1:06 AM\n"), std::string::npos)
+        << read();
+}
+
+TEST_F(IncidentViewTest, APeriodWithoutATimeHasNoWordsThatChange) {
+    show(pageOfIncidents({TransitIncidentRecord::initWithFields({.title = "Works"})}));
+    EXPECT_NE(read().find("Until further notice\n"), std::string::npos);
+    EXPECT_EQ(RunLoop::main().scheduledTimers(), 0U);
 }
 
 } // namespace

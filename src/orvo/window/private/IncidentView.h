@@ -6,34 +6,43 @@
 #include <QScrollArea>
 
 #include <functional>
+#include <memory>
+#include <utility>
+#include <vector>
 
 class QBoxLayout;
 class QLabel;
 
 namespace orvo {
 
+class NSTimer;
+
 /// Shows a page in a window: its heading and, one below the other, its incidents, as long as they
-/// are. All texts can be selected.
+/// are. All texts can be selected. While it is seen, the words of the periods follow the clock.
 class IncidentView final : public QScrollArea {
 public:
     /// Opens a web page.
     using LinkOpener = std::function<void(const QString& url)>;
 
     explicit IncidentView(LinkOpener opener);
+    IncidentView(const IncidentView&) = delete;
+    IncidentView& operator=(const IncidentView&) = delete;
+    ~IncidentView() override;
 
-    /// @param now seconds since 1970, for the words of the periods
-    void show(const IncidentPage& page, double now, const WindowLooks& looks);
+    void show(const IncidentPage& page, const WindowLooks& looks);
 
     /// So wide that lines are good to read, so high as the page needs, within reason.
     [[nodiscard]] QSize sizeHint() const override;
 
 protected:
     void keyPressEvent(QKeyEvent* event) override;
+    void showEvent(QShowEvent* event) override;
+    void hideEvent(QHideEvent* event) override;
 
 private:
     [[nodiscard]] QWidget* heading(const IncidentPage& page) const;
     [[nodiscard]] QWidget* goodService() const;
-    [[nodiscard]] QWidget* incident(const IncidentPage::Incident& incident, double now) const;
+    [[nodiscard]] QWidget* incident(const IncidentPage::Incident& incident);
     void addTexts(QBoxLayout& layout, const IncidentPage::Incident& incident) const;
     /// A mark at the side, and what it is about.
     [[nodiscard]] QWidget*
@@ -44,8 +53,15 @@ private:
     label(const std::string& text, const QFont& font, const QColor& color);
     [[nodiscard]] QLabel* linkLabel(const std::string& url) const;
 
+    /// Says the periods as they are now, and again when their words next change.
+    void followTime();
+    void stopFollowingTime();
+
     LinkOpener _opener;
     WindowLooks _looks;
+    /// Each label with the incident whose period it says.
+    std::vector<std::pair<QLabel*, IncidentPage::Incident>> _periods;
+    std::shared_ptr<NSTimer> _nextWords; ///< nil while nothing is going to change
 };
 
 } // namespace orvo
