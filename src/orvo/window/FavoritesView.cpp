@@ -1,6 +1,7 @@
 #include "orvo/window/private/FavoritesView.h"
 
 #include "orvo/window/WindowTexts.h"
+#include "orvo/window/private/MarkList.h"
 
 #include <QAction>
 #include <QHBoxLayout>
@@ -8,12 +9,10 @@
 #include <QKeyEvent>
 #include <QLabel>
 #include <QLineEdit>
-#include <QListWidget>
-#include <QMimeData>
-#include <QPainter>
 #include <QPushButton>
 #include <QScrollBar>
 #include <QStackedWidget>
+#include <QToolButton>
 #include <QVBoxLayout>
 
 #include <algorithm>
@@ -35,47 +34,6 @@ QString said(const std::string& text) {
     return QString::fromStdString(text);
 }
 
-QListWidgetItem* itemFor(const LineMark& mark, const QString& note) {
-    auto* const item = new QListWidgetItem;
-    item->setData(MarkDelegate::MarkRole, QVariant::fromValue(mark));
-    item->setData(MarkDelegate::NoteRole, note);
-    auto spoken = said(mark.spoken());
-    if (!note.isEmpty())
-        spoken += ", " + note;
-    item->setData(Qt::AccessibleTextRole, spoken);
-    item->setToolTip(spoken.toHtmlEscaped());
-    return item;
-}
-
-QIcon magnifier(const QColor& color, double scale) {
-    constexpr double side = 16;
-    QPixmap pixmap(QSizeF(side * scale, side * scale).toSize());
-    pixmap.setDevicePixelRatio(scale);
-    pixmap.fill(Qt::transparent);
-    QPainter painter(&pixmap);
-    painter.setRenderHint(QPainter::Antialiasing);
-    painter.setPen(QPen(color, 1.6, Qt::SolidLine, Qt::RoundCap));
-    painter.drawEllipse(QRectF(2.5, 2.5, 8, 8));
-    painter.drawLine(QPointF(9.7, 9.7), QPointF(13.2, 13.2));
-    painter.end();
-    return pixmap;
-}
-
-/// A list whose rows are moved inside it and never copied: what travels with the pointer says only
-/// that they are rows, since no other list could read them.
-class RowsList final : public QListWidget {
-protected:
-    [[nodiscard]] QMimeData* mimeData(const QList<QListWidgetItem*>&) const override {
-        auto* const rows = new QMimeData;
-        rows->setData(model()->mimeTypes().value(0), {});
-        return rows;
-    }
-};
-
-LineMark markOf(const QListWidgetItem& item) {
-    return item.data(MarkDelegate::MarkRole).value<LineMark>();
-}
-
 } // namespace
 
 FavoritesView::FavoritesView() {
@@ -91,11 +49,16 @@ void FavoritesView::makeParts() {
     _search->setPlaceholderText(words("Search"));
     _search->setAccessibleName(words("Search"));
     _search->setClearButtonEnabled(true);
-    _search->addAction(QIcon(), QLineEdit::LeadingPosition); // its picture is of the looks
-    _list = list(_delegate, "Favorites_List");
+    for (auto* const button : _search->findChildren<QToolButton*>())
+        button->setAccessibleName(words("Search_Clear"));
+    // Its picture is of the looks.
+    auto* const magnifier = _search->addAction(QIcon(), QLineEdit::LeadingPosition);
+    magnifier->setText(words("Search"));
+    connect(magnifier, &QAction::triggered, _search, [search = _search] { search->setFocus(); });
+    _list = new MarkList(_delegate, words("Favorites_List"));
     _list->setDragDropMode(QAbstractItemView::InternalMove);
     _list->setDefaultDropAction(Qt::MoveAction);
-    _results = list(_delegate, "Search_Results");
+    _results = new MarkList(_delegate, words("Search_Results"));
     _emptyTitle = new QLabel(words("Favorites_None"));
     _emptyText = new QLabel(words("Favorites_NoneText"));
     _noResults = new QLabel;
@@ -114,17 +77,6 @@ void FavoritesView::makeParts() {
     _remove = new QPushButton(words("Remove"));
     for (QPushButton* const button : {_undo, _up, _down, _remove})
         button->setAutoDefault(false);
-}
-
-QListWidget* FavoritesView::list(MarkDelegate* delegate, const std::string& spokenName) {
-    auto* const list = new RowsList;
-    list->setItemDelegate(delegate);
-    list->setAccessibleName(words(spokenName));
-    list->setVerticalScrollMode(QAbstractItemView::ScrollPerPixel);
-    list->setHorizontalScrollBarPolicy(Qt::ScrollBarAlwaysOff);
-    list->setUniformItemSizes(true);
-    list->setFrameShape(QFrame::StyledPanel);
-    return list;
 }
 
 void FavoritesView::arrangeParts() {
@@ -211,7 +163,7 @@ void FavoritesView::setLooks(const WindowLooks& looks) {
     _looks = looks;
     _delegate->setLooks(looks);
     for (QAction* const action : _search->actions())
-        action->setIcon(magnifier(looks.secondary, devicePixelRatioF()));
+        action->setIcon(WindowLooks::magnifier(looks.secondary, devicePixelRatioF()));
     _emptyTitle->setFont(WindowLooks::font(1.15, QFont::DemiBold));
     QPalette faint;
     faint.setColor(QPalette::WindowText, looks.secondary);
@@ -317,7 +269,7 @@ void FavoritesView::showFavorites(std::size_t chosen) {
     const int scrolled = _list->verticalScrollBar()->value();
     _list->clear();
     for (const auto& mark : _editor->favorites())
-        _list->addItem(itemFor(mark, {}));
+        _list->addMark(mark, {});
     _list->setCurrentRow(std::min(static_cast<int>(chosen), _list->count() - 1));
     _list->verticalScrollBar()->setValue(scrolled);
     if (_list->currentItem())
@@ -338,8 +290,7 @@ void FavoritesView::showResults() {
     const auto found = _editor->search(text.toStdString());
     _results->clear();
     for (const auto& result : found.lines)
-        _results->addItem(
-            itemFor(result.line, result.isFavorite ? words("Search_IsFavorite") : QString()));
+        _results->addMark(result.line, result.isFavorite ? words("Search_IsFavorite") : QString());
     _results->setCurrentRow(0);
     _results->setVisible(!found.lines.empty());
     _noResults->setVisible(found.lines.empty());
@@ -362,7 +313,7 @@ void FavoritesView::updateButtons() {
 void FavoritesView::addResult(QListWidgetItem* item) {
     if (!item)
         return;
-    const auto mark = markOf(*item);
+    const auto mark = MarkList::markOf(*item);
     const bool isThere = _editor->indexOfLine(mark.muid) < _editor->favorites().size();
     const auto error = _editor->add(mark.muid);
     say(error, WindowTexts::text(isThere ? "AlreadyAdded" : "Added", mark.title));
@@ -399,7 +350,7 @@ void FavoritesView::removeChosen() {
     const int row = _list->currentRow();
     if (row < 0)
         return;
-    const auto title = markOf(*_list->currentItem()).title;
+    const auto title = MarkList::markOf(*_list->currentItem()).title;
     say(_editor->remove(static_cast<std::size_t>(row)), WindowTexts::text("Removed", title));
     showFavorites(static_cast<std::size_t>(row));
 }

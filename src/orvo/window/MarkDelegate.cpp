@@ -24,6 +24,106 @@ QString textOf(const std::string& text) {
     return QString::fromStdString(text);
 }
 
+/// What stands below the title.
+QString detailOf(const LineMark& mark) {
+    const bool isPosition = mark.muid == 0 && !mark.detail.empty();
+    // Of a position, latitude stands first in every language.
+    return isPosition ? QChar(LeftToRight) + textOf(mark.detail) + QChar(EndOfDirection)
+                      : textOf(mark.detail);
+}
+
+/// One row while it is painted, from its edges to its middle: what is painted takes its room from
+/// what comes later.
+class RowPainting {
+public:
+    RowPainting(QPainter& painter, const QStyleOptionViewItem& option, const WindowLooks& looks)
+        : _painter(painter)
+        , _option(option)
+        , _looks(looks)
+        , _inside(option.rect.adjusted(Side, 0, -Side, 0)) {}
+
+    void paintGround() const;
+    void paintShield(const LineMark& mark);
+    void paintNote(const QString& note);
+    void paintTexts(const QString& title, const QString& detail) const;
+
+private:
+    void paintLine(const QRect& line, const QString& text) const;
+    /// A place in a row that is read from left to right, where it is in this one.
+    [[nodiscard]] QRect placed(const QRect& rect) const {
+        return QStyle::visualRect(_option.direction, _option.rect, rect);
+    }
+
+    QPainter& _painter;
+    const QStyleOptionViewItem& _option;
+    const WindowLooks& _looks;
+    QRect _inside; ///< what is free, as if it were read from left to right
+};
+
+void RowPainting::paintGround() const {
+    if (!_option.state.testFlag(QStyle::State_Selected))
+        return;
+    const QRectF ground = QRectF(_option.rect).adjusted(Inset, 1, -Inset, -1);
+    _painter.setPen(Qt::NoPen);
+    _painter.setBrush(_looks.highlight);
+    _painter.drawRoundedRect(ground, Radius, Radius);
+    if (!_option.state.testFlag(QStyle::State_HasFocus))
+        return;
+    _painter.setPen(QPen(_looks.link, RingWidth));
+    _painter.setBrush(Qt::NoBrush);
+    _painter.drawRoundedRect(ground.adjusted(1, 1, -1, -1), Radius - 1, Radius - 1);
+}
+
+void RowPainting::paintShield(const LineMark& mark) {
+    const double scale = _painter.device()->devicePixelRatioF();
+    int width = ShieldColumn; // titles begin below one another, with or without a shield
+    if (const auto shield = _looks.shield(mark, ShieldSize, scale); !shield.isNull()) {
+        const auto size = shield.deviceIndependentSize().toSize();
+        width = std::max(width, size.width());
+        const QPoint middle(_inside.left() + (width - size.width()) / 2,
+                            _inside.top() + (_inside.height() - size.height()) / 2);
+        _painter.drawPixmap(placed(QRect(middle, size)).topLeft(), shield);
+    }
+    _inside.setLeft(_inside.left() + width + Side);
+}
+
+void RowPainting::paintNote(const QString& note) {
+    if (note.isEmpty())
+        return;
+    const auto font = WindowLooks::font(DetailFactor);
+    QRect room = _inside;
+    room.setLeft(room.right() - QFontMetrics(font).horizontalAdvance(note));
+    _painter.setFont(font);
+    _painter.setPen(_looks.secondary);
+    _painter.drawText(placed(room), Qt::AlignVCenter | Qt::AlignLeft, note);
+    _inside.setRight(room.left() - Side);
+}
+
+void RowPainting::paintTexts(const QString& title, const QString& detail) const {
+    const auto titleFont = WindowLooks::font(1, QFont::Medium);
+    const auto detailFont = WindowLooks::font(DetailFactor);
+    const int titleHeight = QFontMetrics(titleFont).height();
+    const int detailHeight = detail.isEmpty() ? 0 : QFontMetrics(detailFont).height();
+    const int top = _inside.top() + (_inside.height() - titleHeight - detailHeight) / 2;
+    _painter.setFont(titleFont);
+    _painter.setPen(_looks.text);
+    paintLine({_inside.left(), top, _inside.width(), titleHeight}, title);
+    if (detail.isEmpty())
+        return;
+    _painter.setFont(detailFont);
+    _painter.setPen(_looks.secondary);
+    paintLine({_inside.left(), top + titleHeight, _inside.width(), detailHeight}, detail);
+}
+
+/// On the side where reading starts, whatever the language of the text.
+void RowPainting::paintLine(const QRect& line, const QString& text) const {
+    const auto side = _option.direction == Qt::RightToLeft ? Qt::AlignRight : Qt::AlignLeft;
+    const int flags = static_cast<int>(Qt::AlignVCenter) | static_cast<int>(Qt::AlignAbsolute) |
+                      static_cast<int>(Qt::TextSingleLine) | static_cast<int>(side);
+    _painter.drawText(
+        placed(line), flags, _painter.fontMetrics().elidedText(text, Qt::ElideRight, line.width()));
+}
+
 } // namespace
 
 void MarkDelegate::paint(QPainter* painter,
@@ -32,75 +132,11 @@ void MarkDelegate::paint(QPainter* painter,
     const auto mark = index.data(MarkRole).value<LineMark>();
     painter->save();
     painter->setRenderHint(QPainter::Antialiasing);
-    const QRectF ground = QRectF(option.rect).adjusted(Inset, 1, -Inset, -1);
-    if (option.state.testFlag(QStyle::State_Selected)) {
-        painter->setPen(Qt::NoPen);
-        painter->setBrush(_looks.highlight);
-        painter->drawRoundedRect(ground, Radius, Radius);
-        if (option.state.testFlag(QStyle::State_HasFocus)) {
-            painter->setPen(QPen(_looks.link, RingWidth));
-            painter->setBrush(Qt::NoBrush);
-            painter->drawRoundedRect(ground.adjusted(1, 1, -1, -1), Radius - 1, Radius - 1);
-        }
-    }
-    const auto place = [&](const QRect& rect) {
-        return QStyle::visualRect(option.direction, option.rect, rect);
-    };
-    const double scale = painter->device()->devicePixelRatioF();
-    QRect inside = option.rect.adjusted(Side, 0, -Side, 0);
-    int shieldWidth = 0;
-    if (const auto shield = _looks.shield(mark, ShieldSize, scale); !shield.isNull()) {
-        const auto size = shield.deviceIndependentSize().toSize();
-        shieldWidth = std::max(ShieldColumn, size.width());
-        const QRect room(inside.left(), inside.top(), shieldWidth, inside.height());
-        const QRect middle(QPoint(room.left() + (room.width() - size.width()) / 2,
-                                  room.top() + (room.height() - size.height()) / 2),
-                           size);
-        painter->drawPixmap(place(middle).topLeft(), shield);
-    }
-    // Titles begin below one another, with or without a shield.
-    inside.setLeft(inside.left() + std::max(ShieldColumn, shieldWidth) + Side);
-
-    const auto detailFont = WindowLooks::font(DetailFactor);
-    const QFontMetrics detailMetrics(detailFont);
-    const auto note = index.data(NoteRole).toString();
-    if (!note.isEmpty()) {
-        const int width = detailMetrics.horizontalAdvance(note) + 1;
-        QRect room = inside;
-        room.setLeft(room.right() + 1 - width);
-        painter->setFont(detailFont);
-        painter->setPen(_looks.secondary);
-        painter->drawText(place(room), Qt::AlignVCenter | Qt::AlignLeft, note);
-        inside.setRight(room.left() - Side);
-    }
-    const auto titleFont = WindowLooks::font(1, QFont::Medium);
-    const QFontMetrics titleMetrics(titleFont);
-    // Of a position, latitude stands first in every language.
-    const auto detail = mark.muid == 0 && !mark.detail.empty()
-                            ? QChar(LeftToRight) + textOf(mark.detail) + QChar(EndOfDirection)
-                            : textOf(mark.detail);
-    const int height = titleMetrics.height() + (detail.isEmpty() ? 0 : detailMetrics.height());
-    QRect line(inside.left(),
-               inside.top() + (inside.height() - height) / 2,
-               inside.width(),
-               titleMetrics.height());
-    const int start =
-        static_cast<int>(Qt::AlignVCenter) | static_cast<int>(Qt::AlignAbsolute) |
-        static_cast<int>(Qt::TextSingleLine) |
-        static_cast<int>(option.direction == Qt::RightToLeft ? Qt::AlignRight : Qt::AlignLeft);
-    painter->setFont(titleFont);
-    painter->setPen(_looks.text);
-    painter->drawText(place(line),
-                      start,
-                      titleMetrics.elidedText(textOf(mark.title), Qt::ElideRight, line.width()));
-    if (!detail.isEmpty()) {
-        line.translate(0, titleMetrics.height());
-        line.setHeight(detailMetrics.height());
-        painter->setFont(detailFont);
-        painter->setPen(_looks.secondary);
-        painter->drawText(
-            place(line), start, detailMetrics.elidedText(detail, Qt::ElideRight, line.width()));
-    }
+    RowPainting row(*painter, option, _looks);
+    row.paintGround();
+    row.paintShield(mark);
+    row.paintNote(index.data(NoteRole).toString());
+    row.paintTexts(textOf(mark.title), detailOf(mark));
     painter->restore();
 }
 

@@ -7,6 +7,7 @@
 #include <QApplication>
 #include <QFontDatabase>
 #include <QImage>
+#include <QPainter>
 #include <QScreen>
 #include <QStyle>
 
@@ -141,6 +142,20 @@ WindowLooks::fixedImage(std::string_view name, double side, const QColor& color,
         return {};
     auto pixmap = QPixmap::fromImage(imageOf(drawn, pixels, pixels));
     pixmap.setDevicePixelRatio(scale);
+    return pixmap;
+}
+
+QPixmap WindowLooks::magnifier(const QColor& color, double scale) {
+    constexpr double side = 16;
+    QPixmap pixmap(QSizeF(side * scale, side * scale).toSize());
+    pixmap.setDevicePixelRatio(scale);
+    pixmap.fill(Qt::transparent);
+    QPainter painter(&pixmap);
+    painter.setRenderHint(QPainter::Antialiasing);
+    painter.setPen(QPen(color, 1.6, Qt::SolidLine, Qt::RoundCap));
+    painter.drawEllipse(QRectF(2.5, 2.5, 8, 8));
+    painter.drawLine(QPointF(9.7, 9.7), QPointF(13.2, 13.2));
+    painter.end();
     return pixmap;
 }
 

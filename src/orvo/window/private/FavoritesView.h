@@ -10,12 +10,13 @@
 
 class QLabel;
 class QLineEdit;
-class QListWidget;
 class QListWidgetItem;
 class QPushButton;
 class QStackedWidget;
 
 namespace orvo {
+
+class MarkList;
 
 /// The favourites in a window: a field that finds lines and adds them, and the list, whose order
 /// the person changes by dragging or with Alt and the arrow keys. What is removed can be brought
@@ -39,7 +40,6 @@ private:
     void makeParts();
     void arrangeParts();
     void connectParts();
-    [[nodiscard]] static QListWidget* list(MarkDelegate* delegate, const std::string& spokenName);
 
     [[nodiscard]] bool keyInSearch(const QKeyEvent& event);
     [[nodiscard]] bool keyInResults(const QKeyEvent& event);
@@ -68,8 +68,8 @@ private:
     QLabel* _emptyTitle = nullptr;
     QLabel* _emptyText = nullptr;
     QLabel* _noResults = nullptr;
-    QListWidget* _list = nullptr;
-    QListWidget* _results = nullptr;
+    MarkList* _list = nullptr;
+    MarkList* _results = nullptr;
     QLabel* _message = nullptr;
     QPushButton* _undo = nullptr;
     QPushButton* _up = nullptr;

@@ -42,6 +42,8 @@ struct WindowLooks {
     /// One of the program's fixed images, `side` points wide and high.
     [[nodiscard]] static QPixmap
     fixedImage(std::string_view name, double side, const QColor& color, double scale);
+    /// Stands in a field that searches.
+    [[nodiscard]] static QPixmap magnifier(const QColor& color, double scale);
 
 private:
     [[nodiscard]] QPalette palette() const;
