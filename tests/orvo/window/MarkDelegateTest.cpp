@@ -92,5 +92,17 @@ TEST_F(MarkDelegateTest, ALongTitleEndsBeforeTheNote) {
     EXPECT_NE(columns(painted(bare), RowWidth - room, RowWidth), note);
 }
 
+TEST_F(MarkDelegateTest, ATitleWithoutADetailStandsInTheMiddle) {
+    bare.title = "x";
+    bare.detail = "x";
+    const int above = option.rect.height() / 4;
+    EXPECT_FALSE(isEmpty(painted(bare).copy(0, 3 * above - 4, RowWidth, above)));
+    bare.detail = "";
+    const auto alone = painted(bare);
+    EXPECT_TRUE(isEmpty(alone.copy(0, 0, RowWidth, above)));
+    EXPECT_TRUE(isEmpty(alone.copy(0, 3 * above - 4, RowWidth, above)));
+    EXPECT_FALSE(isEmpty(alone));
+}
+
 } // namespace
 } // namespace orvo
