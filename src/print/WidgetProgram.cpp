@@ -172,8 +172,10 @@ ExitCode WidgetProgram::showWindow(const WidgetOptions& options) {
         return ExitCode::Failed;
     const auto code = _windowing->run(
         _extension,
-        WidgetHostSettings{
-            .width = options.width, .maxRows = options.maxRows, .mode = options.mode},
+        WidgetHostSettings{.width = options.width,
+                           .maxRows = options.maxRows,
+                           .mode = options.mode,
+                           .followsLanguage = !options.language},
         [this](const std::shared_ptr<WidgetHost>& host) { keepDemonstration(host); });
     if (_endOfDemonstration)
         _endOfDemonstration->invalidate();

@@ -235,7 +235,13 @@ TEST_F(WindowTest, IsOpenedWithWhatTheCommandLineSays) {
     EXPECT_EQ(window.settings.width, 300);
     EXPECT_EQ(window.settings.mode, NCWidgetDisplayMode::Expanded);
     EXPECT_EQ(window.settings.maxRows, 2U);
+    EXPECT_TRUE(window.settings.followsLanguage);
     EXPECT_EQ(output.str() + error.str(), "");
+}
+
+TEST_F(WindowTest, LanguageThatWasNamedStays) {
+    EXPECT_EQ(runInWindow({"--language", "de"}), Exit::Answered);
+    EXPECT_FALSE(window.settings.followsLanguage);
 }
 
 TEST_F(WindowTest, LivesOnSoItMovesKeepsAndLooksForNewerSchedules) {

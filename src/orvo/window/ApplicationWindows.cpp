@@ -14,22 +14,6 @@ namespace orvo {
 
 namespace {
 
-/// Tells when a window was closed.
-class CloseWatch final : public QObject {
-public:
-    explicit CloseWatch(std::function<void()> closed)
-        : _closed(std::move(closed)) {}
-
-    bool eventFilter(QObject* watched, QEvent* event) override {
-        if (event->type() == QEvent::Close)
-            QMetaObject::invokeMethod(this, _closed, Qt::QueuedConnection);
-        return QObject::eventFilter(watched, event);
-    }
-
-private:
-    std::function<void()> _closed;
-};
-
 void bringToFront(QWidget& window, const std::string& activationToken) {
     if (!activationToken.empty())
         qputenv("XDG_ACTIVATION_TOKEN", QByteArray::fromStdString(activationToken));
@@ -44,6 +28,22 @@ void bringToFront(QWidget& window, const std::string& activationToken) {
 } // namespace
 
 struct ApplicationWindows::Private {
+    /// Tells when a window was closed.
+    class CloseWatch final : public QObject {
+    public:
+        explicit CloseWatch(std::function<void()> closed)
+            : _closed(std::move(closed)) {}
+
+        bool eventFilter(QObject* watched, QEvent* event) override {
+            if (event->type() == QEvent::Close)
+                QMetaObject::invokeMethod(this, _closed, Qt::QueuedConnection);
+            return QObject::eventFilter(watched, event);
+        }
+
+    private:
+        std::function<void()> _closed;
+    };
+
     Private()
         : watch([this] {
             if (allClosed && !isAnyOpen())

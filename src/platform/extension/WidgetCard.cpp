@@ -83,13 +83,18 @@ void WidgetCard::_initWithHost_offersButton(const std::shared_ptr<WidgetHost>& h
     _button = headerLabel();
     for (const auto& view : {std::shared_ptr<UIView>(_icon),
                              std::shared_ptr<UIView>(_name),
-                             std::shared_ptr<UIView>(_button),
-                             host->view()})
+                             std::shared_ptr<UIView>(_button)})
         addSubview(view);
     update();
 }
 
 void WidgetCard::update() {
+    if (_content != _host->view()) {
+        if (_content)
+            _content->removeFromSuperview();
+        _content = _host->view();
+        addSubview(_content);
+    }
     _button->setText(buttonTitle());
     _button->setHidden(!_offersButton || !_host->offersExpanded());
     setNeedsLayout();

@@ -26,7 +26,7 @@ public:
         return {contentSize.width, contentSize.height + HeaderHeight};
     }
 
-    /// Shows the host's mode and whether there is more.
+    /// Shows the host's view and mode, and whether there is more, in the person's language.
     void update();
 
     /// Where a press counts for the button, in the card's coordinates: at least 44 × 36. Empty
@@ -53,6 +53,7 @@ private:
     std::shared_ptr<UIImageView> _icon;
     std::shared_ptr<UILabel> _name;
     std::shared_ptr<UILabel> _button;
+    std::shared_ptr<UIView> _content;
     bool _offersButton = false;
     bool _buttonFocused = false;
 };

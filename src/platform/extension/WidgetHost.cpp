@@ -86,17 +86,16 @@ WidgetHost::~WidgetHost() {
     if (!_controller)
         return;
     _context->setLargestModeTold({});
-    _controller->_setPreferredContentSizeChanged({});
-    if (_visible) {
-        _controller->viewWillDisappear(false);
-        _controller->viewDidDisappear(false);
-    }
+    letGoOfController();
 }
 
 void WidgetHost::_initWithExtension_settings(const Extension& extension,
                                              const WidgetHostSettings& settings) {
     const auto weak = std::weak_ptr<WidgetHost>(strong(this));
     _extensionDescription = extension.description();
+    _makePrincipalObject = [extension] {
+        return extension.makePrincipalObject();
+    };
     _settings = settings;
     _chosenMode =
         settings.mode.value_or(_DisplayModeStore::load(_extensionDescription.bundleIdentifier)
@@ -114,14 +113,27 @@ void WidgetHost::_initWithExtension_settings(const Extension& extension,
         if (const auto self = weak.lock())
             self->requestUpdate();
     });
-    _controller = extension.makePrincipalObject();
+    makeController();
+}
+
+void WidgetHost::makeController() {
+    _controller = _makePrincipalObject();
     _controller->setExtensionContext(_context);
-    _controller->_setPreferredContentSizeChanged([weak](CGSize) {
-        if (const auto self = weak.lock()) {
-            self->_prefersHeight = true;
-            self->updateContentSize();
-        }
-    });
+    _controller->_setPreferredContentSizeChanged(
+        [weak = std::weak_ptr<WidgetHost>(strong(this))](CGSize) {
+            if (const auto self = weak.lock()) {
+                self->_prefersHeight = true;
+                self->updateContentSize();
+            }
+        });
+}
+
+void WidgetHost::letGoOfController() {
+    _controller->_setPreferredContentSizeChanged({});
+    if (_visible) {
+        _controller->viewWillDisappear(false);
+        _controller->viewDidDisappear(false);
+    }
 }
 
 // What is shown
@@ -387,6 +399,26 @@ void WidgetHost::networkDidChange() {
 
 void WidgetHost::didReceiveMemoryWarning() {
     _controller->didReceiveMemoryWarning();
+}
+
+void WidgetHost::startWidgetAnew() {
+    {
+        const Hold hold(*this);
+        const bool wasLoaded = _controller->isViewLoaded();
+        const auto size = _contentSize;
+        letGoOfController();
+        _schedule->setVisible(false);
+        _visible = false;
+        _prefersHeight = false;
+        makeController();
+        if (wasLoaded)
+            loadView();
+        _contentSize = size; // another one is a change that the presenter must hear of
+    }
+    if (const auto presenter = _presenter.lock())
+        presenter->widgetHostDidChangeView(*this);
+    updateContentSize();
+    updateVisibility();
 }
 
 } // namespace orvo

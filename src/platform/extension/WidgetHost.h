@@ -32,6 +32,9 @@ struct WidgetHostSettings {
     /// The mode to begin with; nothing is the one that the person last chose on this profile, which
     /// is then kept too.
     std::optional<NCWidgetDisplayMode> mode = std::nullopt;
+    /// Whether the language is the desktop's, and changes with it; false where the person named
+    /// one.
+    bool followsLanguage = true;
 };
 
 /// Holds a widget: makes its controller and leads it through its life, asks it for updates, and
@@ -61,6 +64,7 @@ public:
     [[nodiscard]] const ExtensionDescription& extensionDescription() const noexcept {
         return _extensionDescription;
     }
+    /// Another one after `startWidgetAnew`.
     [[nodiscard]] const std::shared_ptr<UIViewController>& controller() const noexcept {
         return _controller;
     }
@@ -104,6 +108,10 @@ public:
     void machineDidWake();
     void networkDidChange();
     void didReceiveMemoryWarning();
+    /// The widget ends, and keeps what it shows, and a new one begins with that: in another
+    /// language, say, in which nothing of the old one could go on. Size and mode stay until the new
+    /// one says something else.
+    void startWidgetAnew();
 
     /// Asks for an update, besides those above; several may run at once. The handler, which may be
     /// empty, is called once, never inside this call. While the widget is not visible, too.
@@ -116,6 +124,8 @@ private:
 
     void _initWithExtension_settings(const Extension& extension,
                                      const WidgetHostSettings& settings);
+    void makeController();
+    void letGoOfController();
     void loadView();
     void updateVisibility();
     void updateMaxima(UIContentSizeCategory category);
@@ -129,6 +139,7 @@ private:
     void settleMode();
 
     ExtensionDescription _extensionDescription;
+    std::function<std::shared_ptr<UIViewController>()> _makePrincipalObject;
     WidgetHostSettings _settings;
     std::shared_ptr<UIViewController> _controller;
     std::shared_ptr<_WidgetContext> _context;

@@ -21,6 +21,8 @@ public:
                                                     std::function<void()> completion) = 0;
     /// The mode shown, or whether there is more to show, is another one.
     virtual void widgetHostDidChangeDisplayMode(WidgetHost& host) = 0;
+    /// The host's view is another one.
+    virtual void widgetHostDidChangeView(WidgetHost& host) = 0;
 };
 
 } // namespace orvo

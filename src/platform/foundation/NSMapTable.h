@@ -65,7 +65,7 @@ private:
         }
     };
     struct Entry {
-        std::size_t number;
+        std::size_t number = 0;
         Reference key;
         Reference value;
     };

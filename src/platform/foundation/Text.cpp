@@ -1,5 +1,7 @@
 #include "platform/foundation/Text.h"
 
+#include "platform/foundation/LocaleVariables.h"
+
 #include <unicode/ubrk.h>
 #include <unicode/ucol.h>
 #include <unicode/uloc.h>
@@ -91,18 +93,10 @@ EnvironmentSlot<std::string>& locale() {
 }
 
 std::string defaultLocale() {
-    for (const char* variable : {"LC_ALL", "LC_MESSAGES", "LANG"}) {
-        const char* value = std::getenv(variable);
-        if (!value || !*value)
-            continue;
-        std::string name(value);
-        name.resize(std::min(name.find_first_of(".@"), name.size())); // de_CH.UTF-8@euro
-        if (name == "C" || name == "POSIX")
-            return "en";
-        std::ranges::replace(name, '_', '-');
-        return name;
-    }
-    return "en";
+    return localeOfVariables([](const std::string& variable) -> std::optional<std::string> {
+        const char* const value = std::getenv(variable.c_str());
+        return value ? std::optional<std::string>(value) : std::nullopt;
+    });
 }
 
 bool isRightToLeft(const std::string& tag) {

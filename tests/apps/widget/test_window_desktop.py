@@ -3,13 +3,14 @@
 import time
 import unittest
 
-from window_support import COMPACT_HEIGHT, PATIENCE, MockService, WindowTest, works
+from window_support import CARD_WIDTH, COMPACT_HEIGHT, PATIENCE, MockService, WindowTest, works
 
 LOGIN = "org.freedesktop.login1"
 MANAGER = (LOGIN, "/org/freedesktop/login1", f"{LOGIN}.Manager")
 SESSION = "/org/freedesktop/login1/session/auto"
 PORTAL = ("org.freedesktop.portal.Desktop", "/org/freedesktop/portal/desktop", "org.freedesktop.portal.Settings")
 COMMON = "org.freedesktop.appearance"
+LOCALE = ("org.freedesktop.locale1", "/org/freedesktop/locale1", "org.freedesktop.locale1")
 LIGHT, DARK = "#f4f4f6", "#1e1e22"
 
 
@@ -100,6 +101,34 @@ class Desktop(WindowTest):
         portal.emit("SettingChanged", "ssv", "org.gnome.desktop.interface", "text-scaling-factor",
                     self.dbus.Double(1.5, variant_level=1))
         self.eventually(lambda: self.height() > COMPACT_HEIGHT + 20, "the card has grown")
+        self.close_widget()
+
+    def machine_language(self):
+        """What changes it; it is English at first."""
+        service = MockService(self, self.environment["DBUS_SYSTEM_BUS_ADDRESS"], *LOCALE)
+
+        def locale(name):
+            return self.dbus.Array([f"LANG={name}.UTF-8"], signature="s", variant_level=1)
+        service.add_property("Locale", locale("en_US"))
+        return lambda name: service.update(LOCALE[2], {"Locale": locale(name)})
+
+    def test_it_follows_the_language_in_its_rows_its_header_and_its_direction(self):
+        change = self.machine_language()
+        self.server.tell(works(1, "Works on 1", de="Bauarbeiten auf 1"), works(2, "Works on 2", de="Bauarbeiten auf 2"))
+        self.open_widget(LC_ALL="", LANG="en_US.UTF-8")
+        self.shows("2 advisories")
+        self.button().press()
+        self.shows("Works on 1", "Works on 2", "Good service")
+        self.is_asked(1)
+        change("de_DE")
+        self.shows("Bauarbeiten auf 1", "Bauarbeiten auf 2", "Normaler Betrieb")
+        self.assertEqual(self.button().title, "Weniger anzeigen")
+        right = self.button().middle[0]
+        change("ar_EG")
+        self.eventually(lambda: self.button().middle[0] < right - CARD_WIDTH / 2, "the button is on the other side")
+        self.shows("Works on 1", "Works on 2", "الخدمة")
+        self.button().press()
+        self.eventually(lambda: len(self.rows()) == 1 and self.button().title == "عرض المزيد", "it is used as before")
         self.close_widget()
 
     def wake(self):

@@ -22,9 +22,9 @@ class Wayland(WindowTest):
         self.start_compositor()
         self.live_feed(works(1, "Works on 1"), works(2, "Works on 2"))
 
-    def start_compositor(self):
+    def start_compositor(self, shell="desktop-shell.so"):
         compositor = subprocess.Popen(
-            ["weston", "--backend=headless-backend.so", f"--socket={SOCKET}", "--idle-time=0", "--no-config"],
+            ["weston", "--backend=headless-backend.so", f"--shell={shell}", f"--socket={SOCKET}", "--idle-time=0", "--no-config"],
             env=self.environment, stdout=subprocess.DEVNULL, stderr=subprocess.DEVNULL)
         self.addCleanup(compositor.wait)
         self.addCleanup(compositor.terminate)
@@ -47,11 +47,18 @@ class Wayland(WindowTest):
         self.button().press()
         self.shows("Works on 1", "Works on 2", "Good service")
         self.close_widget()
-        self.open_widget()
+        self.open_widget(XDG_ACTIVATION_TOKEN="from-a-launcher")
         self.shows("Works on 1", "Works on 2", "Good service")
         self.parts("list item")[0].press()
         self.eventually(lambda: "Works on 1" in self.handed_over(), "the row's incident is handed over")
         self.close_widget()
+
+
+class WaylandKiosk(Wayland):
+    """A desktop that makes every window as large as the display, and shows none while nobody has a keyboard."""
+
+    def start_compositor(self, shell="kiosk-shell.so"):
+        super().start_compositor(shell)
 
 
 if __name__ == "__main__":

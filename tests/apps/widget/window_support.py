@@ -271,6 +271,9 @@ class MockService:
         added.__dict__ = {**self.__dict__, "_path": path, "_interface": interface}
         return added
 
+    def add_property(self, name, value):
+        self._mock("AddProperty", self._interface, name, value)
+
     def add_method(self, name, takes, answers, code):
         self._mock("AddMethod", self._interface, name, takes, answers, code)
 
@@ -286,9 +289,9 @@ class MockService:
                    self._test.dbus.Array(arguments, signature="v"))
 
 
-def works(number, title, start=None, end=None):
-    """An alert for a line of the small schedule."""
-    return alert(selector(route=f"r{number}"), *([period(start, end)] if start or end else []), text(10, en=title))
+def works(number, title, start=None, end=None, **titles):
+    """An alert for a line of the small schedule, in English and in the languages that are named."""
+    return alert(selector(route=f"r{number}"), *([period(start, end)] if start or end else []), text(10, en=title, **titles))
 
 
 __all__ = ["CARD_WIDTH", "COMPACT_HEIGHT", "MockService", "NAME", "NOW", "PATIENCE", "PROPERTIES", "SERVICE", "WindowTest", "signal", "sys",

@@ -111,8 +111,11 @@ public:
                                     host.offersExpanded() ? ", more" : ""));
     }
 
+    void widgetHostDidChangeView(WidgetHost& host) override { views.push_back(host.view()); }
+
     std::vector<CGSize> sizes;
     std::vector<std::string> modes;
+    std::vector<std::shared_ptr<UIView>> views;
     std::function<void()> begin;
     std::function<void()> end;
 };

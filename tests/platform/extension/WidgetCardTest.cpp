@@ -54,6 +54,21 @@ TEST_F(WidgetCardTest, OffersTheOtherModeOnlyWhereThereIsMore) {
     EXPECT_EQ(held->displayMode(), Mode::Compact);
 }
 
+TEST_F(WidgetCardTest, ShowsANewWidgetAndTheWordsOfAnotherLanguage) {
+    const auto card = shownCard();
+    const auto views = card->subviews().size();
+    const auto old = std::exchange(widget, std::make_shared<testing::ScriptedWidget>());
+    Text::locale().set("de");
+    held->startWidgetAnew();
+    card->update();
+    card->layoutIfNeeded();
+    EXPECT_EQ(card->buttonTitle(), "Mehr anzeigen");
+    EXPECT_EQ(card->subviews().size(), views);
+    EXPECT_EQ(old->view()->superview(), nullptr);
+    EXPECT_EQ(widget->view()->superview(), card);
+    EXPECT_EQ(widget->view()->frame(), CGRect({0, 36}, {359, 110}));
+}
+
 TEST_F(WidgetCardTest, ThePressedButtonChangesTheModeAndItsWords) {
     const auto card = shownCard();
     card->pressButton();

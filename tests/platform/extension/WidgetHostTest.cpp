@@ -261,6 +261,43 @@ TEST_F(WidgetHostTest, TellsWheneverTheWidgetSaysSomethingOfItsContent) {
     EXPECT_EQ(told, 2) << "also where nothing is another than before";
 }
 
+TEST_F(WidgetHostTest, ANewWidgetBeginsWhereTheOldOneEnds) {
+    const auto held = host();
+    const auto presenter = std::make_shared<testing::ScriptedPresenter>();
+    held->setPresenter(presenter);
+    held->setShown(true);
+    held->setDisplayMode(Mode::Expanded);
+    presenter->sizes.clear();
+    auto old = std::exchange(widget, std::make_shared<testing::ScriptedWidget>());
+    old->taken();
+    widget->rows = 2;
+    held->startWidgetAnew();
+    EXPECT_EQ(old->calls, (Strings{"will disappear", "did disappear"}));
+    EXPECT_EQ(widget->taken(),
+              (Strings{"load 359×330, margins 16 16",
+                       "mode 1 at most 359×616, active 1",
+                       "to 359×220",
+                       "will appear",
+                       "did appear",
+                       "update"}));
+    EXPECT_EQ(held->controller(), widget);
+    EXPECT_EQ(presenter->views, std::vector{widget->view()});
+    EXPECT_EQ(presenter->sizes, std::vector{CGSize(359, 220)});
+    old->setPreferredContentSize({359, 50});
+    EXPECT_EQ(held->contentSize(), CGSize(359, 220)) << "nobody listens to the old one";
+    EXPECT_EQ(old.use_count(), 1);
+}
+
+TEST_F(WidgetHostTest, ANewWidgetThatNobodySeesIsNotLoaded) {
+    const auto held = host();
+    const auto old = std::exchange(widget, std::make_shared<testing::ScriptedWidget>());
+    held->startWidgetAnew();
+    EXPECT_EQ(widget->calls, Strings{});
+    held->setShown(true);
+    EXPECT_EQ(old->calls, Strings{});
+    EXPECT_FALSE(widget->calls.empty());
+}
+
 TEST_F(WidgetHostTest, PassesMemoryWarningsOn) {
     const auto held = host();
     held->didReceiveMemoryWarning();

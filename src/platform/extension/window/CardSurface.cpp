@@ -193,6 +193,12 @@ bool CardSurface::event(QEvent* event) {
             _handlers.exposureChanged();
         return answer;
     }
+    case QEvent::Resize: {
+        const bool answer = QWindow::event(event);
+        if (_handlers.sizeChanged)
+            _handlers.sizeChanged();
+        return answer;
+    }
     case QEvent::FocusIn:
         _handlers.activeChanged(true);
         return true;

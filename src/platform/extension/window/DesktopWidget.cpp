@@ -4,6 +4,7 @@
 #include "platform/extension/window/WidgetWindow.h"
 #include "platform/foundation/DispatchQueue.h"
 #include "platform/foundation/RunLoop.h"
+#include "platform/foundation/Text.h"
 
 #include <QGuiApplication>
 #include <QScreen>
@@ -28,7 +29,8 @@ std::shared_ptr<WidgetHost> hostWithLooks(const Extension& extension,
 DesktopWidget::DesktopWidget(const Extension& extension,
                              const WidgetHostSettings& settings,
                              std::function<void()> closed)
-    : _host(hostWithLooks(extension, settings, _appearance))
+    : _followsLanguage(settings.followsLanguage)
+    , _host(hostWithLooks(extension, settings, _appearance))
     , _window(WidgetWindow::windowWithHost(_host))
     , _events(SystemEvents::factory().get()()) {
     _window->setClosed(std::move(closed));
@@ -44,6 +46,7 @@ DesktopWidget::DesktopWidget(const Extension& extension,
 DesktopWidget::~DesktopWidget() {
     _events->stop();
     _settings.stop();
+    _language.stop();
 }
 
 void DesktopWidget::followDesktop() {
@@ -55,6 +58,8 @@ void DesktopWidget::followDesktop() {
                         [this] {
                             _host->didReceiveMemoryWarning();
                         }});
+    if (_followsLanguage)
+        _language.start([this](const std::string& language) { takeLanguage(language); });
 }
 
 void DesktopWidget::takeAppearance(const DesktopAppearance& appearance) {
@@ -63,6 +68,16 @@ void DesktopWidget::takeAppearance(const DesktopAppearance& appearance) {
     _appearance = appearance;
     _window->setTraits(appearance.appliedTo(UITraitCollection::system().get()));
     appearance.remember();
+}
+
+void DesktopWidget::takeLanguage(const std::string& language) {
+    Text::locale().set(language);
+    auto traits = UITraitCollection::system().get();
+    traits.layoutDirection = Text::isRightToLeft(language)
+                                 ? UIUserInterfaceLayoutDirection::RightToLeft
+                                 : UIUserInterfaceLayoutDirection::LeftToRight;
+    _window->setTraits(traits);
+    _host->startWidgetAnew();
 }
 
 int runDesktopWidget(const Extension& extension,

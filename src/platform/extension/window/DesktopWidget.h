@@ -2,6 +2,7 @@
 
 #include "platform/extension/SystemEvents.h"
 #include "platform/extension/WidgetHost.h"
+#include "platform/settings/DesktopLanguage.h"
 #include "platform/settings/DesktopSettings.h"
 
 #include <functional>
@@ -11,10 +12,10 @@ namespace orvo {
 
 class WidgetWindow;
 
-/// A widget in a window of the desktop, and all that it follows there: looks, lock, sleep, network
-/// and memory. It begins with the looks that were remembered; nothing of the desktop is asked
-/// before the first frame stands. Needs the application object of `makeDesktopApplication`. Main
-/// thread.
+/// A widget in a window of the desktop, and all that it follows there: looks, language, lock,
+/// sleep, network and memory. It begins with the looks that were remembered; nothing of the desktop
+/// is asked before the first frame stands. Needs the application object of
+/// `makeDesktopApplication`. Main thread.
 class DesktopWidget {
 public:
     /// Shows it. `closed` is called when the person has closed the window; it may let go of this.
@@ -32,11 +33,14 @@ public:
 private:
     void followDesktop();
     void takeAppearance(const DesktopAppearance& appearance);
+    void takeLanguage(const std::string& language);
 
     DesktopAppearance _appearance = DesktopAppearance::remembered();
+    bool _followsLanguage;
     std::shared_ptr<WidgetHost> _host;
     std::shared_ptr<WidgetWindow> _window;
     DesktopSettings _settings;
+    DesktopLanguage _language;
     std::shared_ptr<SystemEvents> _events;
 };
 

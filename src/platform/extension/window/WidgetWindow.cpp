@@ -15,6 +15,7 @@
 #include <QMetaObject>
 
 #include <algorithm>
+#include <cmath>
 #include <optional>
 
 namespace orvo {
@@ -48,7 +49,9 @@ struct WidgetWindow::Private {
     void beginTransition(const Transition& next, const std::function<void()>& alongside);
     void placeCard(double progress);
     void endTransition();
-    void settle();
+    void sizeChanged();
+    void setCardOffset(CGPoint offset);
+    void fit();
 
     std::shared_ptr<WidgetHost> host;
     std::shared_ptr<WidgetCard> card;
@@ -59,7 +62,8 @@ struct WidgetWindow::Private {
     QMetaObject::Connection turnEnds;
     UITraitCollection desktopTraits = UITraitCollection::system().get();
     std::optional<Transition> transition;
-    CGSize shownSize; ///< of the card as it is seen, in points
+    CGSize shownSize;   ///< of the card as it is seen, in points
+    CGPoint cardOffset; ///< in the window, while it moves there
     bool isSeen = false;
     std::uint64_t framesShown = 0;
     std::function<void()> closed;
@@ -83,7 +87,8 @@ WidgetWindow::Private::Private(const std::shared_ptr<WidgetHost>& shownHost)
                                 [this] { requestFrameWhereNeeded(); });
     screenChanged();
     shownSize = WidgetCard::sizeForContentSize(host->contentSize());
-    settle();
+    surface->setFrameOnScreen({surface->frameOnScreen().origin, shownSize});
+    fit();
 }
 
 WidgetWindow::Private::~Private() {
@@ -98,6 +103,7 @@ CardSurface::Handlers WidgetWindow::Private::handlers() {
     return {.frame = [this] { showFrame(); },
             .exposureChanged = [this] { exposureChanged(); },
             .screenChanged = [this] { screenChanged(); },
+            .sizeChanged = [this] { sizeChanged(); },
             .activeChanged =
                 [this](bool active) {
                     input.setActive(active);
@@ -123,7 +129,11 @@ void WidgetWindow::Private::draw(Canvas& canvas) const {
     const auto origin = surface->cardOrigin();
     canvas.translate(origin.x, origin.y);
     // While it grows or shrinks it is as large as it will be, and seen in part.
-    canvas.clip({{0, 0}, shownSize}, WidgetCard::CornerRadius);
+    const auto& whole = card->frame().size;
+    canvas.clip(
+        {{0, 0},
+         {std::min(shownSize.width, whole.width), std::min(shownSize.height, whole.height)}},
+        WidgetCard::CornerRadius);
     drawViewHierarchy(*card, canvas);
 }
 
@@ -147,10 +157,10 @@ void WidgetWindow::Private::showFrame() {
 }
 
 void WidgetWindow::Private::requestFrameWhereNeeded() {
-    if (!isSeen)
+    if (framesShown == 0)
         return;
     card->layoutIfNeeded();
-    if (card->_needsDisplay() || surface->isStale())
+    if (isSeen && (card->_needsDisplay() || surface->isStale()))
         surface->requestUpdate();
     else
         accessibility->update();
@@ -165,6 +175,8 @@ void WidgetWindow::Private::exposureChanged() {
         animator->setFrameRequest([this] { surface->requestUpdate(); });
     else
         animator->setFrameRequest({});
+    if (!seen)
+        endTransition();
     host->setShown(seen);
 }
 
@@ -196,6 +208,8 @@ void WidgetWindow::Private::beginTransition(const Transition& next,
         if (progress >= 1)
             endTransition();
     });
+    if (!isSeen)
+        endTransition(); // no frames come
 }
 
 void WidgetWindow::Private::placeCard(double progress) {
@@ -203,7 +217,7 @@ void WidgetWindow::Private::placeCard(double progress) {
         return;
     const auto now = rectBetween(transition->from, transition->to, progress);
     const auto window = rectUniting(transition->from, transition->to);
-    surface->setCardOrigin({now.origin.x - window.origin.x, now.origin.y - window.origin.y});
+    setCardOffset({now.origin.x - window.origin.x, now.origin.y - window.origin.y});
     shownSize = now.size;
     shownSize.height = UIRoundToViewScale(shownSize.height, card.get());
     card->setFrame(
@@ -218,17 +232,33 @@ void WidgetWindow::Private::endTransition() {
     animator->cancel(*card, SizeChange);
     shownSize = ended.to.size;
     surface->setFrameOnScreen(ended.to);
-    settle();
+    card->setNeedsDisplay();
+    fit();
     ended.completion();
 }
 
-/// The card fills its window.
-void WidgetWindow::Private::settle() {
-    surface->setCardOrigin({0, 0});
-    card->setFrame({{0, 0}, shownSize});
-    card->setNeedsDisplay();
+void WidgetWindow::Private::sizeChanged() {
     if (!transition)
-        surface->setFrameOnScreen({surface->frameOnScreen().origin, shownSize});
+        fit();
+}
+
+/// In a window that the desktop made wider the card stands in the middle, at the top.
+void WidgetWindow::Private::setCardOffset(CGPoint offset) {
+    cardOffset = offset;
+    const auto spare = surface->frameOnScreen().size.width - std::ceil(shownSize.width);
+    surface->setCardOrigin({offset.x + std::max<CGFloat>(std::floor(spare / 2), 0), offset.y});
+}
+
+/// In a window that the desktop made smaller the card is smaller too: its rows scroll.
+void WidgetWindow::Private::fit() {
+    setCardOffset({0, 0});
+    const auto room = surface->frameOnScreen().size;
+    const CGRect frame{
+        {0, 0}, {std::min(shownSize.width, room.width), std::min(shownSize.height, room.height)}};
+    if (card->frame() == frame)
+        return;
+    card->setFrame(frame);
+    card->setNeedsDisplay();
 }
 
 // The window
@@ -307,14 +337,18 @@ void WidgetWindow::widgetHost_transitionToContentSize(WidgetHost&,
     auto& window = *_private;
     const auto wanted = WidgetCard::sizeForContentSize(size);
     const auto frame = window.surface->frameOnScreen();
-    const auto origin = window.surface->cardOrigin();
-    const CGRect from{{frame.origin.x + origin.x, frame.origin.y + origin.y}, window.shownSize};
+    const auto offset = window.cardOffset;
+    const CGRect from{{frame.origin.x + offset.x, frame.origin.y + offset.y}, window.shownSize};
     window.endTransition();
     const auto to = windowFramePlacing(from.origin, wanted, window.surface->freePartOfScreen());
     window.beginTransition({from, to, std::move(completion)}, alongside);
 }
 
 void WidgetWindow::widgetHostDidChangeDisplayMode(WidgetHost&) {
+    _private->card->update();
+}
+
+void WidgetWindow::widgetHostDidChangeView(WidgetHost&) {
     _private->card->update();
 }
 

@@ -12,7 +12,9 @@ class WidgetCard;
 
 /// A window of the desktop with a widget's card in it, and nothing else: no frame, and corners that
 /// one looks through. The card grows and shrinks to what the host says, in a quarter of a second
-/// or, with reduced motion, at once, and stays on the screen. The person moves it by its header.
+/// or, with reduced motion or where nobody sees it, at once, and stays on the screen. The person
+/// moves it by its header. The window is as large as the card; where the desktop makes it larger,
+/// the card stands at its top in the middle, and where smaller, the card is as small, and scrolls.
 ///
 /// The widget is shown to its host once its first frame stands, so that what it kept is seen before
 /// anything is fetched; it is not shown while the window is hidden, minimised or covered by a
@@ -57,6 +59,7 @@ public:
                                             std::function<void()> alongside,
                                             std::function<void()> completion) override;
     void widgetHostDidChangeDisplayMode(WidgetHost& host) override;
+    void widgetHostDidChangeView(WidgetHost& host) override;
 
 private:
     struct Private;

@@ -2,6 +2,10 @@
 
 #include <gmock/gmock.h>
 
+#include <algorithm>
+#include <functional>
+#include <vector>
+
 namespace orvo {
 namespace {
 
@@ -119,6 +123,33 @@ TEST_F(WidgetWindowTest, GrowsInAQuarterOfASecond) {
     EXPECT_EQ(world.colorAt({8, 300}), ground);
 }
 
+/// How high the card is seen, in points, to ten of them: below it the screen is black.
+int seenHeight(const WindowWorld& world) {
+    int height = static_cast<int>(world.window->frame().size.height);
+    while (height > 10 && world.colorAt({40, height - 1}) == QColor(Qt::black))
+        height -= 10;
+    return height;
+}
+
+TEST_F(WidgetWindowTest, GrowthPassesThroughTheHeightsBetween) {
+    WindowWorld world;
+    world.show();
+    world.click(Button);
+    std::vector<int> heights;
+    while (world.window->isChangingSize()) {
+        ASSERT_LT(heights.size(), 100U);
+        world.monotonic->advance(0.0625);
+        world.settle();
+        heights.push_back(seenHeight(world));
+    }
+    ASSERT_EQ(heights.size(), 4U) << "a quarter of a second";
+    EXPECT_GT(heights.front(), 146);
+    EXPECT_LT(heights.front(), 366);
+    EXPECT_EQ(std::ranges::adjacent_find(heights, std::ranges::greater_equal()), heights.end());
+    EXPECT_EQ(heights.back(), 366);
+    EXPECT_EQ(world.window->card()->frame().size.height, 36 + world.host->preferredHeight());
+}
+
 TEST_F(WidgetWindowTest, ShrinksBeforeTheWindowDoes) {
     WindowWorld world;
     world.show();
@@ -175,6 +206,79 @@ TEST_F(WidgetWindowTest, WhatIsHigherThanTheScreenScrolls) {
     EXPECT_EQ(world.widget->table->contentOffset().y, 66) << "pixels are exact";
 }
 
+TEST_F(WidgetWindowTest, StandsAtTheTopOfALargerWindow) {
+    WindowWorld world;
+    world.show();
+    world.toolkitWindow().resize(800, 600);
+    world.settle();
+    const auto ground = QColor("#f4f4f6");
+    EXPECT_EQ(world.window->card()->frame().size, (CGSize{359, 146}));
+    EXPECT_EQ(world.colorAt({400, 3}), ground);
+    EXPECT_NE(world.colorAt({215, 70}), ground) << "left of the card one looks through";
+    EXPECT_EQ(world.colorAt({225, 70}), ground);
+    EXPECT_EQ(world.colorAt({574, 70}), ground);
+    EXPECT_NE(world.colorAt({584, 70}), ground);
+    EXPECT_NE(world.colorAt({400, 150}), ground);
+    world.click({FirstRow.x() + 220, FirstRow.y()});
+    EXPECT_THAT(world.widget->pressed, ElementsAre("red"));
+}
+
+TEST_F(WidgetWindowTest, RowsAreLaidOutInALargerWindow) {
+    WindowWorld world;
+    world.show();
+    world.host->setDisplayMode(Mode::Expanded);
+    world.toolkitWindow().resize(800, 600); // the desktop does not do what it was asked
+    world.finish();
+    world.toolkitWindow().resize(800, 600);
+    world.settle();
+    EXPECT_EQ(world.window->card()->frame().size, (CGSize{359, 366}));
+    world.click({FirstRow.x() + 220, FirstRow.y() + 220});
+    EXPECT_THAT(world.widget->pressed, ElementsAre("blue"));
+    EXPECT_EQ(world.colorAt({225, 300}), QColor("#f4f4f6"));
+}
+
+TEST_F(WidgetWindowTest, ScrollsInASmallerWindow) {
+    WindowWorld world;
+    world.show();
+    world.expand();
+    world.toolkitWindow().resize(300, 200);
+    world.settle();
+    EXPECT_EQ(world.window->card()->frame().size, (CGSize{300, 200}));
+    world.wheel({0, -500}, {0, -120});
+    EXPECT_EQ(world.widget->table->contentOffset().y, 330 - 164);
+    world.click({100, 190});
+    EXPECT_THAT(world.widget->pressed, ElementsAre("blue"));
+    world.click({270, 18});
+    EXPECT_EQ(world.host->displayMode(), Mode::Compact) << "the button is there";
+    world.finish();
+    EXPECT_EQ(world.window->frame().size, (CGSize{359, 146})) << "asked for anew";
+    EXPECT_EQ(world.window->card()->frame().size, (CGSize{359, 146}));
+}
+
+TEST_F(WidgetWindowTest, ChangesAtOnceWhereNobodySeesIt) {
+    WindowWorld world;
+    world.show();
+    world.window->hide();
+    world.settle();
+    world.host->setDisplayMode(Mode::Expanded);
+    EXPECT_FALSE(world.window->isChangingSize());
+    EXPECT_EQ(world.window->frame().size.height, 366);
+    EXPECT_TRUE(RunLoop::main().runUntil(
+        [&] { return world.widget->table->visibleCells().size() == 3; }, 20))
+        << "assistive tools may look";
+}
+
+TEST_F(WidgetWindowTest, ChangeUnderWayEndsWhenTheWindowIsHidden) {
+    WindowWorld world;
+    world.show();
+    world.click(Button);
+    EXPECT_TRUE(world.window->isChangingSize());
+    world.window->hide();
+    world.settle();
+    EXPECT_FALSE(world.window->isChangingSize());
+    EXPECT_EQ(world.window->frame().size.height, 366);
+}
+
 TEST_F(WidgetWindowTest, ClicksOpenRows) {
     WindowWorld world;
     world.show();
@@ -183,6 +287,21 @@ TEST_F(WidgetWindowTest, ClicksOpenRows) {
     world.mouse(QEvent::MouseButtonPress, FirstRow, Qt::RightButton);
     world.mouse(QEvent::MouseButtonRelease, FirstRow, Qt::RightButton);
     EXPECT_THAT(world.widget->pressed, ElementsAre("red"));
+}
+
+TEST_F(WidgetWindowTest, ShowsAWidgetThatBegan) {
+    WindowWorld world;
+    world.show();
+    const auto frames = world.window->framesShown();
+    const auto old = std::exchange(world.widget, std::make_shared<testing::TableWidget>());
+    world.widget->rows = {"rot"};
+    world.host->startWidgetAnew();
+    world.settle();
+    EXPECT_GT(world.window->framesShown(), frames);
+    EXPECT_EQ(world.window->frame().size, (CGSize{359, 146}));
+    world.click(FirstRow);
+    EXPECT_THAT(world.widget->pressed, ElementsAre("rot"));
+    EXPECT_THAT(old->pressed, IsEmpty());
 }
 
 TEST_F(WidgetWindowTest, PointerTellsWhatCanBePressed) {

@@ -25,6 +25,7 @@ public:
         std::function<void()> frame;           ///< it is time to show what has changed
         std::function<void()> exposureChanged; ///< `isSeen()` may be another
         std::function<void()> screenChanged;   ///< its scale or its free part may be another
+        std::function<void()> sizeChanged;     ///< by the program or by the desktop
         std::function<void(bool active)> activeChanged;
         std::function<void()> closed;
         std::function<QAccessibleInterface*()> accessibleRoot;
@@ -38,7 +39,7 @@ public:
     [[nodiscard]] bool isSeen() const;
     /// In points of the desktop; on a desktop that does not tell where windows are, at its origin.
     [[nodiscard]] CGRect frameOnScreen() const;
-    /// Only the program changes its size.
+    /// A person cannot change its size. A desktop may give it another one all the same.
     void setFrameOnScreen(const CGRect& frame);
     /// The part of its screen that no panel takes.
     [[nodiscard]] CGRect freePartOfScreen() const;
