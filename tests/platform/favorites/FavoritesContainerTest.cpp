@@ -62,7 +62,9 @@ TEST(FavoritesContainer, CallsItsBlockOnAWorkerQueueAndNeverInsideTheCall) {
         // A block that ran inside the call would wait here for ever.
         const std::lock_guard lock(held);
         container->accessContentsUsingConcurrentBlock([&](const std::shared_ptr<NSArray>&) {
-            const std::lock_guard inside(held);
+            {
+                const std::lock_guard inside(held);
+            } // given back before the answer: this function's end takes the mutex with it
             onWorker.set_value(DispatchQueue::globalQueue()->isCurrent());
         });
     }
