@@ -20,12 +20,9 @@ std::shared_ptr<OWTransitListItem> OWTransitIncidentDataSourceErrorBuilder::list
 }
 
 std::shared_ptr<OWTransitItem> OWTransitIncidentDataSourceErrorBuilder::_buildErrorItem() const {
+    auto title = WidgetTexts::localized("TransitWidgetLoadingError_Title");
     return OWTransitItem::initWithPrimaryText_secondaryText_artwork_artworkHidden_openable(
-        WidgetTexts::localized("TransitWidgetLoadingError_Title"),
-        _errorMessage(),
-        nullptr,
-        true,
-        nullptr);
+        std::move(title), _errorMessage(), nullptr, true, nullptr);
 }
 
 std::optional<std::string> OWTransitIncidentDataSourceErrorBuilder::_errorMessage() const {

@@ -47,16 +47,21 @@ std::shared_ptr<TransitArtworkDataSource> artworkOfSystem(const TransitLine& lin
     return system ? system->artwork() : nullptr;
 }
 
-std::shared_ptr<OWTransitItem> fixedRow(std::string primaryText,
-                                        std::string secondaryText,
-                                        std::shared_ptr<OWConfiguredArtwork> artwork,
-                                        std::shared_ptr<OWOpenable> openable) {
+/// In braces, so that every compiler looks texts up and shares sessions in this order.
+struct FixedRow {
+    std::string primaryText;
+    std::string secondaryText;
+    std::shared_ptr<OWConfiguredArtwork> artwork;
+    std::shared_ptr<OWOpenable> openable;
+};
+
+std::shared_ptr<OWTransitItem> fixedRow(FixedRow row) {
     return OWTransitItem::initWithPrimaryText_secondaryText_artwork_artworkHidden_openable(
-        std::move(primaryText),
-        std::move(secondaryText),
-        std::move(artwork),
+        std::move(row.primaryText),
+        std::move(row.secondaryText),
+        std::move(row.artwork),
         false,
-        std::move(openable));
+        std::move(row.openable));
 }
 
 std::shared_ptr<OWUserActivityData>
@@ -120,9 +125,10 @@ void OWTransitIncidentsDataSourceBuilder::recordDisplayed(
 std::shared_ptr<OWTransitListItem>
 OWTransitIncidentsDataSourceBuilder::noFavoritesListItem() const {
     recordDisplayed({}, NSMapTable::identityMapTable());
+    auto title = WidgetTexts::noFavoritesTitle();
     const auto item =
         OWTransitItem::initWithPrimaryText_secondaryText_artwork_artworkHidden_openable(
-            WidgetTexts::noFavoritesTitle(),
+            std::move(title),
             WidgetTexts::noFavoritesSecondaryText(),
             nullptr,
             true,
@@ -240,10 +246,10 @@ OWTransitIncidentsDataSourceBuilder::shapedListItem(_OWDisplayedIncidents& displ
         rows.push_back(row.item);
     if (rows.empty())
         return OWTransitListItem::initWithSummaryItem_expandedItems(
-            fixedRow(WidgetTexts::goodServiceTitle(),
-                     WidgetTexts::goodServiceSecondaryText(_lineItems->count()),
-                     imageArtwork("good-v2", FullAlpha),
-                     NSURLOWOpenable::openableWithURL(_urlForFavorites())),
+            fixedRow({WidgetTexts::goodServiceTitle(),
+                      WidgetTexts::goodServiceSecondaryText(_lineItems->count()),
+                      imageArtwork("good-v2", FullAlpha),
+                      NSURLOWOpenable::openableWithURL(_urlForFavorites())}),
             NSArray::array());
 
     const bool hasClearLines = !displayed.clearLines().empty();
@@ -254,10 +260,10 @@ OWTransitIncidentsDataSourceBuilder::shapedListItem(_OWDisplayedIncidents& displ
             _summaryItemForIncidents_items_itemToLinesMap(displayed.incidents(), displayed.rows());
     if (hasClearLines)
         rows.push_back(
-            fixedRow(WidgetTexts::goodServiceTitle(),
-                     WidgetTexts::clearServiceSecondaryText(displayed.clearLines().size()),
-                     imageArtwork("good-alt-v2", DimmedAlpha),
-                     NSURLOWOpenable::openableWithURL(_urlForFavorites())));
+            fixedRow({WidgetTexts::goodServiceTitle(),
+                      WidgetTexts::clearServiceSecondaryText(displayed.clearLines().size()),
+                      imageArtwork("good-alt-v2", DimmedAlpha),
+                      NSURLOWOpenable::openableWithURL(_urlForFavorites())}));
     if (hasOneAdvisory && !hasClearLines)
         rows.clear(); // the one row is the compact one already
     else if (!hasOneAdvisory)
@@ -305,10 +311,9 @@ OWTransitIncidentsDataSourceBuilder::_summaryItemForIncidents_items_itemToLinesM
             known.insert(*artwork, artworks.size());
             artworks.push_back(std::move(artwork));
         }
+    auto text = WidgetTexts::summaryText(incidents.size());
     return OWTransitSummaryItem::initWithText_artworks_userActivityData(
-        WidgetTexts::summaryText(incidents.size()),
-        NSArray::arrayOf(artworks),
-        _activityDataForIncidents(incidents));
+        std::move(text), NSArray::arrayOf(artworks), _activityDataForIncidents(incidents));
 }
 
 std::shared_ptr<NSURL> OWTransitIncidentsDataSourceBuilder::_urlForFavorites() {
@@ -327,10 +332,10 @@ OWTransitIncidentsDataSourceBuilder::_incidentsOverflowItemForIncidents_incident
     for (const auto& incident : incidents)
         if (const auto line = mapping->objectForKey(incident))
             lines->setObject_forKey(line, line);
-    return fixedRow(WidgetTexts::overflowTitle(incidents.size()),
-                    WidgetTexts::overflowSecondaryText(lines->count()),
-                    imageArtwork("advisories-v2", DimmedAlpha),
-                    _activityDataForIncidents(incidents));
+    return fixedRow({WidgetTexts::overflowTitle(incidents.size()),
+                     WidgetTexts::overflowSecondaryText(lines->count()),
+                     imageArtwork("advisories-v2", DimmedAlpha),
+                     _activityDataForIncidents(incidents)});
 }
 
 } // namespace orvo

@@ -98,12 +98,14 @@ protected:
     testing::StoppedClock clock;
     std::deque<int> lockAnswers;
     int lockQuestions = 0;
+    double lockSeconds = 0; ///< how long each question takes
     std::shared_ptr<RecordingStore> store = std::make_shared<RecordingStore>();
     EnvironmentSlot<std::shared_ptr<AnalyticsStore>>::Override storeOverride =
         AnalyticsPortal::store().overrideWith(store);
     EnvironmentSlot<DeviceLockStateFunction>::Override lockOverride =
         DeviceLockStateSource().overrideWith([this] {
             ++lockQuestions;
+            clock->advance(lockSeconds);
             if (lockAnswers.empty())
                 return 0;
             const int answer = lockAnswers.front();
@@ -291,6 +293,15 @@ TEST_F(AnalyticsDelegateTest, LockedIsOneAtFirstOrTwoAtTheSecondQuestion) {
     EXPECT_TRUE(locked({0, 2}, 2));
     EXPECT_FALSE(locked({2, 0}, 2));
     EXPECT_FALSE(locked({0, 1}, 2));
+}
+
+TEST_F(AnalyticsDelegateTest, DurationIsTakenAfterTheLockWasAskedFor) {
+    lockSeconds = 2;
+    delegate->startSessionIfNeeded();
+    clock->advance(10);
+    delegate->recordCloseSessionSwiping();
+    ASSERT_EQ(store->interactions.size(), 1U);
+    EXPECT_DOUBLE_EQ(store->interactions[0].duration, 14);
 }
 
 } // namespace

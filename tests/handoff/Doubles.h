@@ -29,8 +29,10 @@ public:
     }
     std::string sharedSessionID() const override {
         _journal->push_back("conversion");
-        return "S1";
+        return identifier;
     }
+
+    std::string identifier = "S1"; ///< what conversions add; empty for nothing
 
 private:
     Journal _journal;

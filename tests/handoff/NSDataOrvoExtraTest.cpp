@@ -63,6 +63,21 @@ TEST(NSDataOrvoExtra, BytesBehindTheStreamAreRefused) {
         *NSData::dataWithString(std::string(compressed->stringView()) + "x")));
 }
 
+TEST(NSDataOrvoExtra, CompressedDataIsTheRoutinesOwnBufferNotACopy) {
+    const std::uint8_t* made = nullptr;
+    const auto scope = Bzip2Compressor().overrideWith(
+        [&](const std::uint8_t*, std::size_t, std::uint8_t** output, std::size_t* length) {
+            *output = static_cast<std::uint8_t*>(std::calloc(5, 1)); // freed with the data
+            *length = 5;
+            made = *output;
+            return true;
+        });
+    const auto compressed = bzip2CompressedData(*NSData::dataWithString("a"));
+    ASSERT_TRUE(compressed);
+    EXPECT_EQ(compressed->bytes().data(), made);
+    EXPECT_EQ(compressed->length(), 5U);
+}
+
 TEST(NSDataOrvoExtra, FailedCompressionFreesItsBufferAndAnswersNil) {
     const auto scope = Bzip2Compressor().overrideWith(
         [](const std::uint8_t*, std::size_t, std::uint8_t** output, std::size_t* length) {

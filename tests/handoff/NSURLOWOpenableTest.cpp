@@ -36,6 +36,18 @@ TEST(NSURLOWOpenable, AContextThatIsNoViewControllerDoesNothingAtAll) {
     EXPECT_FALSE(called);
 }
 
+TEST(NSURLOWOpenable, AControllerOutsideAHostNeverAnswers) {
+    const testing::OpeningDoubles doubles;
+    doubles.controller->setExtensionContext(nullptr);
+    bool called = false;
+    openable("orvo://?t=r")
+        ->openInContext_completionHandler(
+            doubles.controller, [&](bool, const std::shared_ptr<NSError>&) { called = true; });
+    EXPECT_EQ(*doubles.journal,
+              (std::vector<std::string>{"session callback=0 share=1 reset=0", "conversion"}));
+    EXPECT_FALSE(called);
+}
+
 TEST(NSURLOWOpenable, AnswersTheFlagWithoutAnErrorEvenWhenItDidNotOpen) {
     const testing::OpeningDoubles doubles;
     std::vector<bool> answers;

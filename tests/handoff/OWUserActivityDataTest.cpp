@@ -11,6 +11,7 @@
 
 #include <algorithm>
 #include <optional>
+#include <thread>
 
 namespace orvo {
 namespace {
@@ -78,6 +79,19 @@ TEST_F(OWUserActivityDataTest, NilTypesOnBothSidesAreEqual) {
     EXPECT_FALSE(equal(a, OWUserActivityData::initWithActivityType_userInfo("", nullptr)));
 }
 
+TEST_F(OWUserActivityDataTest, NilUserInfosAreEqualDifferFromEmptyOnesAndHashAsZero) {
+    doubles.session->identifier = ""; // so that nothing is added to them
+    const auto make = [](const std::shared_ptr<NSDictionary>& userInfo) {
+        return OWUserActivityData::initWithActivityType_userInfo(Type, userInfo);
+    };
+    ASSERT_FALSE(make(nullptr)->userInfo());
+    EXPECT_TRUE(equal(make(nullptr), make(nullptr)));
+    EXPECT_FALSE(equal(make(nullptr), make(NSDictionary::dictionary())));
+    EXPECT_FALSE(equal(make(NSDictionary::dictionary()), make(nullptr)));
+    EXPECT_EQ(make(nullptr)->hash(), NSString::string(Type)->hash());
+    EXPECT_EQ(OWUserActivityData::initWithActivityType_userInfo(std::nullopt, nullptr)->hash(), 0U);
+}
+
 TEST_F(OWUserActivityDataTest, HashIsTypeXorUserInfo) {
     const auto data = OWUserActivityData::initWithActivityType_userInfo(Type, info("a"));
     EXPECT_EQ(data->hash(), NSString::string(Type)->hash() ^ data->userInfo()->hash());
@@ -109,6 +123,27 @@ TEST_F(OWUserActivityDataTest, PassesANilHandlerThroughAsNil) {
         ->openInContext_completionHandler(nullptr, {});
     ASSERT_EQ(doubles.system->calls, 1);
     EXPECT_FALSE(doubles.system->handler);
+}
+
+TEST_F(OWUserActivityDataTest, OpeningSharesNoSessionASecondTime) {
+    const auto scope = process(ApplicationProxy::applicationProxyForIdentifier("com.zentu.Orvo"));
+    const auto data = OWUserActivityData::initWithActivityType_userInfo(Type, info("a"));
+    doubles.journal->clear();
+    data->openInContext_completionHandler(doubles.controller, {});
+    EXPECT_EQ(*doubles.journal, (std::vector<std::string>{"open activity"}));
+}
+
+TEST_F(OWUserActivityDataTest, HandlerIsCalledWhereThePlatformAnswers) {
+    const auto scope = process(ApplicationProxy::applicationProxyForIdentifier("com.zentu.Orvo"));
+    std::thread::id calledOn;
+    OWUserActivityData::initWithActivityType_userInfo(Type, nullptr)
+        ->openInContext_completionHandler(nullptr, [&](bool, const std::shared_ptr<NSError>&) {
+            calledOn = std::this_thread::get_id();
+        });
+    std::thread platform([&] { doubles.system->handler(true, nullptr); });
+    const auto platformThread = platform.get_id();
+    platform.join();
+    EXPECT_EQ(calledOn, platformThread);
 }
 
 TEST_F(OWUserActivityDataTest, RefusedTypeEndsWithAnErrorThatHoldsTheDescription) {

@@ -50,6 +50,13 @@ TEST_F(ErrorBuilderTest, SecondLineSaysTheNetworksState) {
     EXPECT_EQ(secondLine(4), "TransitWidgetLoadingError_Unknown[%1$@][%2$@][%3$@]");
 }
 
+TEST_F(ErrorBuilderTest, TitleIsLookedUpBeforeTheSecondLine) {
+    (void)builder()->listItem();
+    EXPECT_EQ(world.bundle->keys,
+              (std::vector<std::string>{"TransitWidgetLoadingError_Title",
+                                        "TransitWidgetLoadingError_Unknown"}));
+}
+
 TEST_F(ErrorBuilderTest, DiagnosisAboveFourHasNoMessage) {
     EXPECT_EQ(secondLine(5), std::nullopt);
     EXPECT_EQ(secondLine(~std::uint64_t{0}), std::nullopt);

@@ -120,6 +120,19 @@ TEST_F(BuilderTest, ResultPicksTheBuilder) {
     EXPECT_EQ(forError->analyticsResultType(), 0);
 }
 
+TEST_F(BuilderTest, ErrorOffersTheCompactModeAndReportsNothing) {
+    const auto analytics = std::make_shared<RecordingAnalytics>();
+    const auto list = OWTransitDataSourceBuilderForResult(
+                          Result::resultWithError(NSError::errorWithMessage("d", 1, "m")),
+                          2,
+                          world.cache,
+                          analytics)
+                          ->listItem();
+    EXPECT_EQ(OWTransitListItemNCWidget::widgetLargestAvailableDisplayMode(*list),
+              NCWidgetDisplayMode::Compact);
+    EXPECT_TRUE(analytics->reports.empty());
+}
+
 TEST_F(BuilderTest, ListItemIsBuiltOnceAndRecordedOnce) {
     const auto analytics = std::make_shared<RecordingAnalytics>();
     const auto builder = world.builder(lines(2, 1), 0, analytics);
@@ -198,6 +211,7 @@ TEST_F(BuilderTest, OneAdvisoryWithClearLinesIsNeverCut) {
     const auto list = world.list(lines(1, 2), 1);
     ASSERT_EQ(rows(list).size(), 2U);
     EXPECT_EQ(rows(list)[0], list->summaryItem()); // the same object
+    EXPECT_EQ(rows(list)[1]->primaryText(), "TransitWidget_GoodService_Title[%1$@][%2$@][%3$@]");
     EXPECT_EQ(imageName(rows(list)[1]), "good-alt-v2");
     EXPECT_EQ(rows(list)[1]->artwork()->alpha(), 0.3);
     EXPECT_EQ(rows(list)[1]->secondaryText(),
@@ -398,6 +412,22 @@ TEST_F(BuilderTest, LineActivityHoldsTheLineAndMapTypeThreeOnly) {
     EXPECT_EQ(activity->dictionaryRepresentation()->count(), 2U);
 }
 
+TEST_F(BuilderTest, RestoredLineItemIsTheSourceOfThePayload) {
+    const auto stored = TransitStorageLineItem::initWithLineItem(
+        line(7,
+             {incident(70), incident(71)},
+             {.name = "U7", .system = testing::system("S", "S"), .alternate = artwork("U7")}));
+    const auto restored = protoMessageWithBytes<TransitStorageLineItem>(stored->data()->bytes());
+    ASSERT_TRUE(restored);
+    const auto list = world.list({restored});
+    ASSERT_EQ(rows(list).size(), 2U);
+    for (const auto& row : rows(list)) {
+        EXPECT_TRUE(equal(sized(row)->artwork(), artwork("U7")));
+        EXPECT_TRUE(equal(payload(row)->lineItem(), stored));
+    }
+    EXPECT_EQ(muidsOfList(summary(list)->userActivityData()), (std::vector<std::uint64_t>{70, 71}));
+}
+
 TEST_F(BuilderTest, FailedCompressionLeavesTheRowWithoutAnOpenable) {
     const auto scope = Bzip2Compressor().overrideWith(
         [](const std::uint8_t*, std::size_t, std::uint8_t**, std::size_t*) { return false; });
@@ -437,17 +467,31 @@ TEST_F(BuilderTest, RowsAreRewrittenBeforeTheReportAndShapedAfterIt) {
     (void)world.builder({shared, other, line(3, {incident(30)})}, 2, analytics)->listItem();
     EXPECT_EQ(analytics->keysBefore,
               (std::vector<std::string>{"TransitWidget_2_Lines_Prepended_Incident_Text"}));
-    ASSERT_EQ(world.bundle->keys.size(), 4U); // and then those of the overflow row
-    EXPECT_EQ(world.bundle->keys[1], "TransitWidget_Summary_advisory_count");
+    EXPECT_EQ(world.bundle->keys,
+              (std::vector<std::string>{"TransitWidget_2_Lines_Prepended_Incident_Text",
+                                        "TransitWidget_Summary_advisory_count",
+                                        "TransitWidget_advisory_overflow_title",
+                                        "TransitWidget_AdvisoriesOverflow_SecondaryText"}));
 }
 
 TEST_F(BuilderTest, MappingKnowsIncidentsByIdentity) {
     const auto analytics = std::make_shared<RecordingAnalytics>();
-    const auto met = incident(10);
-    (void)world.builder({line(1, {met}), line(2, {incident(10)})}, 0, analytics)->listItem();
+    const auto met = TransitStorageIncident::initWithIncident(incident(10));
+    const auto twin = TransitStorageIncident::initWithIncident(incident(10));
+    ASSERT_TRUE(equal(met, twin));
+    (void)world.builder({line(1, {met}), line(2, {twin})}, 0, analytics)->listItem();
     ASSERT_EQ(analytics->reports[0].mapping->count(), 1U);
     EXPECT_TRUE(analytics->reports[0].mapping->objectForKey(met));
-    EXPECT_FALSE(analytics->reports[0].mapping->objectForKey(incident(10)));
+    EXPECT_FALSE(analytics->reports[0].mapping->objectForKey(twin));
+}
+
+TEST_F(BuilderTest, RowsThatLookTheSameStayApart) {
+    const auto list = world.list({line(1, {incident(10), incident(11)}, {.name = "U1"}),
+                                  line(2, {incident(11)}, {.name = "U2"})});
+    ASSERT_EQ(rows(list).size(), 3U);
+    EXPECT_EQ(rows(list)[0]->secondaryText(), "Summary"); // only the other one is shared
+    EXPECT_EQ(rows(list)[1]->secondaryText(),
+              "TransitWidget_2_Lines_Prepended_Incident_Text[U1][U2][Summary]");
 }
 
 class SharedRowTest : public BuilderTest {
@@ -526,6 +570,24 @@ TEST_F(BuilderTest, SummaryShowsDistinctShieldsInRowOrderSharedRowsTheLinesOwn) 
     EXPECT_EQ(summary(list)->primaryText(), "TransitWidget_Summary_advisory_count[5][][]");
 }
 
+TEST_F(BuilderTest, TextsAreLookedUpInTheOrderInWhichRowsShowThem) {
+    const auto keys = [&](const Lines& all) {
+        world.bundle->keys.clear();
+        (void)world.list(all);
+        return world.bundle->keys;
+    };
+    EXPECT_EQ(keys({}),
+              (std::vector<std::string>{"TransitWidget_NoFavoriteTransitLines_Title",
+                                        "TransitWidget_NoFavoriteTransitLines_SecondaryText"}));
+    EXPECT_EQ(keys(lines(0, 1)),
+              (std::vector<std::string>{"TransitWidget_GoodService_Title",
+                                        "TransitWidget_GoodService_SecondaryText"}));
+    EXPECT_EQ(keys(lines(2, 1)),
+              (std::vector<std::string>{"TransitWidget_Summary_advisory_count",
+                                        "TransitWidget_GoodService_Title",
+                                        "TransitWidget_GoodService_Overflow_SecondaryText"}));
+}
+
 TEST_F(BuilderTest, ThreeAdvisoriesOfOneSystemWithoutOwnShieldsGiveOneArtwork) {
     const auto system = testing::system("S", "S");
     const auto list = world.list({line(1, {incident(10)}, {.system = system}),
@@ -554,6 +616,32 @@ TEST_F(BuilderTest, FavouritesURLSharesTheSessionAndThenConvertsTheBuiltURL) {
     EXPECT_EQ(*doubles.journal,
               (std::vector<std::string>{"session callback=0 share=1 reset=0", "conversion"}));
     EXPECT_EQ(url->absoluteString(), "orvo://?favorites=2&t=r&session=S1");
+}
+
+TEST_F(BuilderTest, SessionIsSharedForEachRowAsItIsMade) {
+    const testing::OpeningDoubles doubles;
+    const auto shared = [&](const std::shared_ptr<OWTransitListItem>&) {
+        const auto count = std::ranges::count_if(
+            *doubles.journal, [](const auto& entry) { return entry.starts_with("session"); });
+        doubles.journal->clear();
+        return count;
+    };
+    EXPECT_EQ(shared(world.list({})), 0); // its URL goes as it stands
+    EXPECT_EQ(shared(world.list(lines(0, 2))), 1);
+    EXPECT_EQ(shared(world.list(lines(1, 0))), 1);
+    EXPECT_EQ(shared(world.list(lines(1, 1))), 2);
+    EXPECT_EQ(shared(world.list(lines(3, 1))), 5); // three rows, the summary, the clear row
+    EXPECT_EQ(shared(world.list(lines(3, 1), 2)),
+              6); // and the overflow row; hidden ones are made too
+}
+
+TEST_F(BuilderTest, FavouritesURLIsConvertedWhenBuiltAndAgainWhenOpened) {
+    const testing::OpeningDoubles doubles;
+    const auto row = summaryRow(world.list(lines(0, 1)));
+    EXPECT_EQ(std::ranges::count(*doubles.journal, "conversion"), 1);
+    row->openable()->openInContext_completionHandler(doubles.controller, {});
+    EXPECT_EQ(std::ranges::count(*doubles.journal, "conversion"), 2);
+    EXPECT_EQ(doubles.journal->back(), "open orvo://?favorites=2&t=r&session=S1");
 }
 
 } // namespace

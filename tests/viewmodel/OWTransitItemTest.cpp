@@ -4,6 +4,7 @@
 #include "platform/foundation/Hashing.h"
 #include "platform/foundation/NSCoder.h"
 #include "platform/foundation/NSCoding.h"
+#include "platform/foundation/NSKeyedArchiver.h"
 #include "platform/foundation/NSString.h"
 #include "platform/uikit/UIImage.h"
 #include "viewmodel/ArtworkDataSourceCacheTransitWidget.h"
@@ -104,6 +105,34 @@ TEST(OWConfiguredArtwork, OneSourceWithoutSecureCodingIsUnequalEvenWithTheSameCo
     const auto insecure = configured(std::make_shared<CodedSource>("a", false), 1);
     EXPECT_FALSE(equal(secure, insecure));
     EXPECT_FALSE(equal(insecure, secure));
+}
+
+TEST(OWConfiguredArtwork, SourcesAreArchivedSecurelyAndOnlyWhereThatDecides) {
+    int archived = 0;
+    const auto scope = NSKeyedArchiver::archiving().overrideWith(
+        [&](const auto&, bool requiresSecureCoding, auto*) {
+            EXPECT_TRUE(requiresSecureCoding);
+            ++archived;
+            return NSData::dataWithString("the same");
+        });
+    const auto source = [](bool isSecure) {
+        return std::make_shared<CodedSource>("a", isSecure);
+    };
+    EXPECT_TRUE(equal(configured(source(true), 1), configured(source(true), 1)));
+    EXPECT_EQ(archived, 2);
+    const auto one = source(true);
+    EXPECT_TRUE(equal(configured(one, 1), configured(one, 1)));
+    EXPECT_FALSE(equal(configured(one, 1), configured(source(true), 0.5)));
+    EXPECT_FALSE(equal(configured(one, 1), configured(source(false), 1)));
+    EXPECT_FALSE(equal(configured(one, 1), configured(std::make_shared<HashedSource>(1), 1)));
+    EXPECT_EQ(archived, 2);
+}
+
+TEST(OWConfiguredArtwork, SourcesThatCannotBeArchivedAreUnequal) {
+    const auto scope = NSKeyedArchiver::archiving().overrideWith(
+        [](const auto&, bool, auto*) { return std::shared_ptr<NSData>(); });
+    EXPECT_FALSE(equal(configured(std::make_shared<CodedSource>("a", true), 1),
+                       configured(std::make_shared<CodedSource>("a", true), 1)));
 }
 
 TEST(OWConfiguredArtwork, AcceptsSubclasses) {
