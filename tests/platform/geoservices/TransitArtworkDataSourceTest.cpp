@@ -64,6 +64,13 @@ TEST(TransitArtworkDataSource, EachFieldTellsArtworksApart) {
     EXPECT_TRUE(tellsApart([](auto& f) { f.iconDataSource = nullptr; }));
     EXPECT_TRUE(tellsApart([](auto& f) { f.iconFallbackShieldDataSource = nullptr; }));
     EXPECT_TRUE(tellsApart([](auto& f) { f.textDataSource = nullptr; }));
+    const auto other = TransitShieldDataSource::initWithFields({.shieldType = 1});
+    EXPECT_TRUE(tellsApart([&](auto& f) { f.shieldDataSource = other; }));
+    EXPECT_TRUE(tellsApart([&](auto& f) { f.iconFallbackShieldDataSource = other; }));
+    EXPECT_TRUE(tellsApart([](auto& f) {
+        f.textDataSource = TransitTextDataSource::initWithFields(
+            {.text = ServerFormattedString::initWithFields({.alternativeString = "alternative"})});
+    }));
     EXPECT_TRUE(tellsApart([](auto& f) { f.hasRoutingIncidentBadge = true; }));
     EXPECT_TRUE(tellsApart([](auto& f) { f.accessibilityText = std::nullopt; }));
     EXPECT_FALSE(tellsApart([](auto&) {}));
@@ -106,11 +113,29 @@ TEST(ServerFormattedString, EachListAndTheAlternativeTellTextsApart) {
     EXPECT_TRUE(differs([](auto& f) { f.formatStrings = texts({"a"}); }));
     EXPECT_TRUE(differs([](auto& f) { f.formatStrings = texts({"b", "a"}); }));
     EXPECT_TRUE(differs([](auto& f) { f.separators = nullptr; }));
+    EXPECT_TRUE(differs([](auto& f) { f.separators = texts({"; "}); }));
+    EXPECT_TRUE(differs([](auto& f) { f.formatTokens = nullptr; }));
     EXPECT_TRUE(differs([](auto& f) {
         f.formatTokens = NSArray::arrayOf(
             {ServerFormatToken::initWithFields({.type = 1, .token = "n", .text = "y"})});
     }));
     EXPECT_TRUE(differs([](auto& f) { f.alternativeString = std::nullopt; }));
+}
+
+TEST(ServerFormatToken, EachFieldTellsTokensApart) {
+    const auto token = [](ServerFormatToken::Fields fields) {
+        return ServerFormatToken::initWithFields(std::move(fields));
+    };
+    const auto plain = token({.type = 1, .token = "n", .text = "x", .value = 2});
+    EXPECT_TRUE(equal(plain, token({.type = 1, .token = "n", .text = "x", .value = 2})));
+    EXPECT_FALSE(equal(plain, token({.type = 9, .token = "n", .text = "x", .value = 2})));
+    EXPECT_FALSE(equal(plain, token({.type = 1, .token = "m", .text = "x", .value = 2})));
+    EXPECT_FALSE(equal(plain, token({.type = 1, .token = "n", .text = "y", .value = 2})));
+    EXPECT_FALSE(equal(plain, token({.type = 1, .token = "n", .text = std::nullopt, .value = 2})));
+    EXPECT_FALSE(equal(plain, token({.type = 1, .token = "n", .text = "x", .value = 3})));
+    const auto zero = token({.value = 0.0});
+    EXPECT_TRUE(equal(zero, token({.value = -0.0})));
+    EXPECT_EQ(zero->hash(), token({.value = -0.0})->hash());
 }
 
 TEST(ServerFormattedString, NilListEqualsAnEmptyOne) {
