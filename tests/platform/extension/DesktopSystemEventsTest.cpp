@@ -2,12 +2,8 @@
 
 #include "platform/foundation/DispatchSource.h"
 #include "platform/foundation/RunLoop.h"
-#include "support/PrivateBus.h"
+#include "support/ScriptedBusService.h"
 
-#include <QDBusConnection>
-#include <QDBusMessage>
-#include <QDBusVariant>
-#include <QDBusVirtualObject>
 #include <gtest/gtest.h>
 
 #include <cstdlib>
@@ -27,47 +23,32 @@ constexpr uint Offline = 20;
 constexpr double Patience = 20;
 
 /// Stands for logind and NetworkManager: answers for two properties, and sends signals.
-class ScriptedServices final : public QDBusVirtualObject {
+class ScriptedServices final : public testing::ScriptedBusService {
 public:
     explicit ScriptedServices(const std::string& address)
-        : bus(QDBusConnection::connectToBus(QString::fromStdString(address), "scripted-services")) {
-        bus.registerVirtualObject("/", this, QDBusConnection::SubPath);
-        bus.registerService(Login);
-        bus.registerService(Network);
-    }
-    ~ScriptedServices() override { QDBusConnection::disconnectFromBus("scripted-services"); }
+        : ScriptedBusService(address, {Login, Network}) {}
 
-    QString introspect(const QString&) const override { return {}; }
-    bool handleMessage(const QDBusMessage& message, const QDBusConnection& connection) override {
-        ++asked;
-        const auto name = message.arguments().value(1).toString();
-        const QVariant value = name == "LockedHint" ? QVariant(locked) : QVariant(network);
-        connection.send(message.createReply(QVariant::fromValue(QDBusVariant(value))));
-        return true;
-    }
-    void
-    signal(const char* path, const char* interface, const char* name, const QVariant& value) const {
-        auto message = QDBusMessage::createSignal(path, interface, name);
-        message << value;
-        bus.send(message);
-    }
     void setLocked(bool isLocked) {
         locked = isLocked;
-        auto message = QDBusMessage::createSignal("/org/freedesktop/login1/session/_31",
-                                                  "org.freedesktop.DBus.Properties",
-                                                  "PropertiesChanged");
-        message << QString(Session) << QVariantMap{{"LockedHint", isLocked}} << QStringList();
-        bus.send(message);
+        propertiesChanged(
+            "/org/freedesktop/login1/session/_31", Session, {{"LockedHint", isLocked}}, {});
     }
     void setNetwork(uint state) {
         network = state;
-        signal(NetworkPath, Network, "StateChanged", state);
+        signal(NetworkPath, Network, "StateChanged", {state});
+    }
+    void prepareForSleep(bool begins) const {
+        signal("/org/freedesktop/login1", Manager, "PrepareForSleep", {begins});
     }
 
-    QDBusConnection bus;
     bool locked = false;
     uint network = Online;
-    int asked = 0;
+
+protected:
+    QVariant answerTo(const QDBusMessage& question) override {
+        const auto name = question.arguments().value(1).toString();
+        return propertyAnswer(name == "LockedHint" ? QVariant(locked) : QVariant(network));
+    }
 };
 
 /// Memory that becomes scarce when the test says so.
@@ -85,13 +66,6 @@ class DesktopSystemEventsTest : public ::testing::Test {
 protected:
     using Strings = std::vector<std::string>;
 
-    /// One for all tests of the process, which finds the system's bus only once.
-    static std::string busAddress() {
-        static const testing::PrivateBus bus;
-        (void)RunLoop::main();
-        setenv("DBUS_SYSTEM_BUS_ADDRESS", bus.address().c_str(), 1);
-        return bus.address();
-    }
     /// Until both services have answered what is asked at the start.
     void start() {
         events.start(handlers());
@@ -116,14 +90,14 @@ protected:
     }
     /// Messages come in order: what was sent before has arrived then.
     void wake() {
-        services.signal("/org/freedesktop/login1", Manager, "PrepareForSleep", false);
+        services.prepareForSleep(false);
         RunLoop::main().runUntil([&] { return !heard.empty() && heard.back() == "woke"; },
                                  Patience);
         if (!heard.empty())
             heard.pop_back();
     }
 
-    ScriptedServices services{busAddress()};
+    ScriptedServices services{testing::desktopBusAddress()};
     std::vector<std::shared_ptr<ScriptedMemory>> memory;
     EnvironmentSlot<DispatchSource::Factory>::Override memoryOverride =
         DispatchSource::memoryPressureFactory().overrideWith(
@@ -151,8 +125,8 @@ TEST_F(DesktopSystemEventsTest, TellsOfASessionThatIsLockedFromTheStart) {
 
 TEST_F(DesktopSystemEventsTest, TellsWhenTheMachineWakesAndNotWhenItGoesToSleep) {
     start();
-    services.signal("/org/freedesktop/login1", Manager, "PrepareForSleep", true);
-    services.signal("/org/freedesktop/login1", Manager, "PrepareForSleep", false);
+    services.prepareForSleep(true);
+    services.prepareForSleep(false);
     EXPECT_TRUE(hears({"woke"}));
 }
 

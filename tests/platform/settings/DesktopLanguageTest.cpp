@@ -2,12 +2,8 @@
 
 #include "platform/foundation/RunLoop.h"
 #include "platform/foundation/Text.h"
-#include "support/PrivateBus.h"
+#include "support/ScriptedBusService.h"
 
-#include <QDBusConnection>
-#include <QDBusMessage>
-#include <QDBusVariant>
-#include <QDBusVirtualObject>
 #include <gmock/gmock.h>
 
 #include <cstdlib>
@@ -26,46 +22,27 @@ constexpr const char* LocaledPath = "/org/freedesktop/locale1";
 constexpr double Patience = 20;
 
 /// Stands for localed, which says that its property is another one, and not which.
-class ScriptedLocaled final : public QDBusVirtualObject {
+class ScriptedLocaled final : public testing::ScriptedBusService {
 public:
     ScriptedLocaled(const std::string& address, QVariant value)
-        : locale(std::move(value))
-        , bus(QDBusConnection::connectToBus(QString::fromStdString(address), "scripted-localed")) {
-        bus.registerVirtualObject("/", this, QDBusConnection::SubPath);
-        bus.registerService(Localed);
-    }
-    ~ScriptedLocaled() override { QDBusConnection::disconnectFromBus("scripted-localed"); }
+        : ScriptedBusService(address, {Localed})
+        , locale(std::move(value)) {}
 
-    QString introspect(const QString&) const override { return {}; }
-    bool handleMessage(const QDBusMessage& message, const QDBusConnection& connection) override {
-        ++asked;
-        connection.send(message.createReply(QVariant::fromValue(QDBusVariant(locale))));
-        return true;
-    }
     void change(const QVariant& value) {
         locale = value;
-        auto signal = QDBusMessage::createSignal(
-            LocaledPath, "org.freedesktop.DBus.Properties", "PropertiesChanged");
-        signal << QString(Localed) << QVariantMap() << QStringList{"Locale"};
-        bus.send(signal);
+        propertiesChanged(LocaledPath, Localed, {}, {"Locale"});
     }
 
     QVariant locale;
-    QDBusConnection bus;
-    int asked = 0;
+
+protected:
+    QVariant answerTo(const QDBusMessage&) override { return propertyAnswer(locale); }
 };
 
 class DesktopLanguageTest : public ::testing::Test {
 protected:
     using Strings = std::vector<std::string>;
 
-    /// One for all tests of the process, which finds the system's bus only once.
-    static std::string busAddress() {
-        static const testing::PrivateBus bus;
-        (void)RunLoop::main();
-        setenv("DBUS_SYSTEM_BUS_ADDRESS", bus.address().c_str(), 1);
-        return bus.address();
-    }
     void SetUp() override { forgetChoices(); }
     void TearDown() override { forgetChoices(); }
     static void forgetChoices() {
@@ -98,7 +75,7 @@ protected:
                std::exchange(told, {}) == expected;
     }
 
-    std::string address = busAddress();
+    std::string address = testing::desktopBusAddress();
     EnvironmentSlot<std::string>::Override english = Text::locale().overrideWith("en-US");
     std::unique_ptr<ScriptedLocaled> localed;
     DesktopLanguage language;

@@ -1,17 +1,14 @@
 #include "platform/settings/DesktopSettings.h"
 
 #include "platform/foundation/RunLoop.h"
-#include "support/PrivateBus.h"
+#include "support/ScriptedBusService.h"
 
-#include <QDBusConnection>
-#include <QDBusMessage>
 #include <QDBusMetaType>
-#include <QDBusVariant>
-#include <QDBusVirtualObject>
 #include <gtest/gtest.h>
 
 #include <cstdlib>
 #include <memory>
+#include <string>
 #include <vector>
 
 namespace orvo {
@@ -26,54 +23,42 @@ constexpr const char* Gnome = "org.gnome.desktop.interface";
 constexpr double Patience = 20;
 
 /// Stands for the settings portal.
-class ScriptedPortal final : public QDBusVirtualObject {
+class ScriptedPortal final : public testing::ScriptedBusService {
 public:
     ScriptedPortal(const std::string& address, Settings settings)
-        : known(std::move(settings))
-        , bus(QDBusConnection::connectToBus(QString::fromStdString(address), "scripted-portal")) {
+        : ScriptedBusService(address, {Portal})
+        , known(std::move(settings)) {
         qDBusRegisterMetaType<Settings>();
-        bus.registerVirtualObject("/", this, QDBusConnection::SubPath);
-        bus.registerService(Portal);
     }
-    ~ScriptedPortal() override { QDBusConnection::disconnectFromBus("scripted-portal"); }
 
-    QString introspect(const QString&) const override { return {}; }
-    bool handleMessage(const QDBusMessage& message, const QDBusConnection& connection) override {
-        ++asked;
-        if (message.member() != "ReadAll" || answersNonsense) {
-            connection.send(message.createReply(QString("nonsense")));
-            return true;
-        }
-        Settings answer;
-        for (const auto& space : message.arguments().value(0).toStringList()) {
-            if (known.contains(space))
-                answer[space] = known[space];
-        }
-        connection.send(message.createReply(QVariant::fromValue(answer)));
-        return true;
-    }
     void change(const QString& space, const QString& key, const QVariant& value) {
         known[space][key] = value;
-        auto signal = QDBusMessage::createSignal(
-            "/org/freedesktop/portal/desktop", Interface, "SettingChanged");
-        signal << space << key << QVariant::fromValue(QDBusVariant(value));
-        bus.send(signal);
+        signal("/org/freedesktop/portal/desktop",
+               Interface,
+               "SettingChanged",
+               {space, key, QVariant::fromValue(QDBusVariant(value))});
     }
 
     Settings known;
-    QDBusConnection bus;
-    int asked = 0;
     bool answersNonsense = false;
+
+protected:
+    QVariant answerTo(const QDBusMessage& question) override {
+        if (question.member() != "ReadAll" || answersNonsense)
+            return QString("nonsense");
+        Settings answer;
+        for (const auto& space : question.arguments().value(0).toStringList()) {
+            if (known.contains(space))
+                answer[space] = known[space];
+        }
+        return QVariant::fromValue(answer);
+    }
 };
 
 class DesktopSettingsTest : public ::testing::Test {
 protected:
-    void SetUp() override {
-        (void)RunLoop::main();
-        setenv("DBUS_SESSION_BUS_ADDRESS", bus.address().c_str(), 1);
-    }
     void startPortal(const Settings& known) {
-        portal = std::make_unique<ScriptedPortal>(bus.address(), known);
+        portal = std::make_unique<ScriptedPortal>(address, known);
     }
     void follow() {
         settings.start([this](const DesktopAppearance& appearance) { told.push_back(appearance); });
@@ -82,7 +67,7 @@ protected:
         return RunLoop::main().runUntil([&] { return told.size() >= times; }, Patience);
     }
 
-    testing::PrivateBus bus;
+    std::string address = testing::desktopBusAddress();
     std::unique_ptr<ScriptedPortal> portal;
     DesktopSettings settings;
     std::vector<DesktopAppearance> told;
