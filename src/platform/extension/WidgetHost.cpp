@@ -3,13 +3,14 @@
 #include "platform/extension/WidgetPresenter.h"
 #include "platform/extension/WidgetUpdateSchedule.h"
 #include "platform/extension/_DisplayModeStore.h"
+#include "platform/extension/_HeldWidget.h"
 #include "platform/extension/_TransitionBlocks.h"
 #include "platform/extension/_WidgetContext.h"
 #include "platform/foundation/DispatchQueue.h"
 #include "platform/foundation/NSNotificationCenter.h"
 #include "platform/uikit/UIFontDescriptor.h"
+#include "platform/uikit/UIView.h"
 #include "platform/uikit/UIViewController.h"
-#include "platform/uikit/table/UIScrollView.h"
 
 #include <algorithm>
 #include <cmath>
@@ -31,29 +32,11 @@ CGFloat compactHeightIn(UIContentSizeCategory category) {
     return std::round(WidgetHost::CompactHeight * size / standard);
 }
 
-/// How far down the contents of a view reach, what could be scrolled to included.
-CGFloat contentHeightOf(const UIView& view) {
-    CGFloat bottom = 0;
-    for (const auto& subview : view.subviews()) {
-        const auto scrolling = std::dynamic_pointer_cast<UIScrollView>(subview);
-        const auto& frame = subview->frame();
-        const auto height = scrolling ? scrolling->contentSize().height : frame.size.height;
-        bottom = std::max(bottom, frame.origin.y + height);
-    }
-    return bottom;
-}
-
 /// How many whole rows the expanded widget has room for.
 double rowsWithin(const _WidgetContext& context) {
     return std::floor(
         context.widgetMaximumSizeForDisplayMode(NCWidgetDisplayMode::Expanded).height /
         context.widgetMaximumSizeForDisplayMode(NCWidgetDisplayMode::Compact).height);
-}
-
-std::shared_ptr<UIView> outermost(std::shared_ptr<UIView> view) {
-    while (const auto above = view->superview())
-        view = above;
-    return view;
 }
 
 } // namespace
@@ -83,10 +66,10 @@ WidgetHost::hostWithExtension_settings(const Extension& extension,
 WidgetHost::WidgetHost() = default;
 
 WidgetHost::~WidgetHost() {
-    if (!_controller)
+    if (!_widget)
         return;
     _context->setLargestModeTold({});
-    letGoOfController();
+    _widget->end();
 }
 
 void WidgetHost::_initWithExtension_settings(const Extension& extension,
@@ -113,68 +96,42 @@ void WidgetHost::_initWithExtension_settings(const Extension& extension,
         if (const auto self = weak.lock())
             self->requestUpdate();
     });
-    makeController();
+    makeWidget();
 }
 
-void WidgetHost::makeController() {
-    _controller = _makePrincipalObject();
-    _controller->setExtensionContext(_context);
-    _controller->_setPreferredContentSizeChanged(
-        [weak = std::weak_ptr<WidgetHost>(strong(this))](CGSize) {
-            if (const auto self = weak.lock()) {
-                self->_prefersHeight = true;
+void WidgetHost::makeWidget() {
+    _widget = std::make_unique<_HeldWidget>(
+        _makePrincipalObject(), _context, [weak = std::weak_ptr<WidgetHost>(strong(this))] {
+            if (const auto self = weak.lock())
                 self->updateContentSize();
-            }
         });
-}
-
-void WidgetHost::letGoOfController() {
-    _controller->_setPreferredContentSizeChanged({});
-    if (_visible) {
-        _controller->viewWillDisappear(false);
-        _controller->viewDidDisappear(false);
-    }
 }
 
 // What is shown
 
+const std::shared_ptr<UIViewController>& WidgetHost::controller() const noexcept {
+    return _widget->controller();
+}
+
 const std::shared_ptr<UIView>& WidgetHost::view() {
-    if (!_controller->isViewLoaded())
+    if (!_widget->isLoaded())
         loadView();
-    return _controller->view();
+    return _widget->view();
 }
 
 void WidgetHost::loadView() {
     const Hold hold(*this);
-    // The controller makes its view and then reads its width, so that comes between the two.
-    _controller->loadView();
-    const auto view = _controller->view();
-    view->setDirectionalLayoutMargins({0, SideMargin, 0, SideMargin});
-    view->setFrame({{0, 0}, _contentSize});
-    _controller->viewDidLoad();
-    if (const auto widget = std::dynamic_pointer_cast<NCWidgetProviding>(_controller))
-        widget->widgetActiveDisplayModeDidChange_withMaximumSize(
-            displayMode(), maximumSizeForDisplayMode(displayMode()));
+    _widget->load(_contentSize, {0, SideMargin, 0, SideMargin});
     _contentSize.height = std::min(preferredHeight(), heightLimit());
-    view->setFrame({{0, 0}, _contentSize});
+    _widget->view()->setFrame({{0, 0}, _contentSize});
 }
 
 CGFloat WidgetHost::preferredHeight() const {
-    if (_prefersHeight)
-        return std::max<CGFloat>(_controller->preferredContentSize().height, 0);
-    return shownHeight();
-}
-
-CGFloat WidgetHost::shownHeight() const {
-    if (displayMode() == NCWidgetDisplayMode::Compact || !_controller->isViewLoaded())
+    if (const auto preferred = _widget->preferredHeight())
+        return *preferred;
+    if (displayMode() == NCWidgetDisplayMode::Compact || !_widget->isLoaded())
         return maximumSizeForDisplayMode(NCWidgetDisplayMode::Compact).height;
-    const auto view = _controller->view();
-    const auto frame = view->frame();
-    view->setFrame({frame.origin, {frame.size.width, std::min(heightLimit(), Boundless)}});
-    view->layoutIfNeeded();
-    const auto height = contentHeightOf(*view);
-    view->setFrame(frame);
-    return height;
+    return _widget->heightOfContentsWithin(std::min(heightLimit(), Boundless));
 }
 
 CGFloat WidgetHost::heightLimit() const {
@@ -204,7 +161,7 @@ void WidgetHost::updateMaxima(UIContentSizeCategory category) {
 }
 
 void WidgetHost::updateContentSize() {
-    if (_holds > 0 || _modeWillSettle || !_controller->isViewLoaded())
+    if (_holds > 0 || _modeWillSettle || !_widget->isLoaded())
         return;
     const CGSize size{_settings.width, std::min(preferredHeight(), heightLimit())};
     if (size == _contentSize)
@@ -215,7 +172,7 @@ void WidgetHost::updateContentSize() {
 
 void WidgetHost::transitionTo(CGSize size) {
     const auto blocks = std::make_shared<_TransitionBlocks>();
-    _controller->viewWillTransitionToSize_withTransitionCoordinator(size, blocks);
+    controller()->viewWillTransitionToSize_withTransitionCoordinator(size, blocks);
     const auto alongside = [blocks] {
         blocks->runAnimations();
     };
@@ -226,7 +183,7 @@ void WidgetHost::transitionTo(CGSize size) {
         presenter->widgetHost_transitionToContentSize(*this, size, alongside, completion);
         return;
     }
-    const auto& view = _controller->view();
+    const auto& view = _widget->view();
     view->setFrame({view->frame().origin, size});
     alongside();
     completion();
@@ -249,9 +206,7 @@ void WidgetHost::showMode(NCWidgetDisplayMode mode) {
     {
         const Hold hold(*this);
         _context->setActiveMode(mode);
-        if (const auto widget = std::dynamic_pointer_cast<NCWidgetProviding>(_controller))
-            widget->widgetActiveDisplayModeDidChange_withMaximumSize(
-                mode, maximumSizeForDisplayMode(mode));
+        _widget->tellMode();
     }
     if (const auto presenter = _presenter.lock())
         presenter->widgetHostDidChangeDisplayMode(*this);
@@ -310,40 +265,29 @@ void WidgetHost::updateVisibility() {
     _visible = visible;
     if (!visible) {
         _schedule->setVisible(false);
-        _controller->viewWillDisappear(false);
-        _controller->viewDidDisappear(false);
+        _widget->disappear();
         return;
     }
     static_cast<void>(view());
     {
         const Hold hold(*this);
-        _controller->viewWillAppear(false);
-        _controller->viewDidAppear(false);
+        _widget->appear();
     }
     updateContentSize();
     _schedule->setVisible(true);
 }
 
 void WidgetHost::requestUpdate(NCWidgetProviding::UpdateHandler handler) {
-    const auto widget = std::dynamic_pointer_cast<NCWidgetProviding>(_controller);
-    if (!widget) {
-        DispatchQueue::mainQueue()->async([handler = std::move(handler)] {
-            if (handler)
-                handler(NCUpdateResult::NoData);
-        });
-        return;
-    }
     ++_requestsRunning;
-    widget->widgetPerformUpdateWithCompletionHandler(
-        [weak = std::weak_ptr<WidgetHost>(strong(this)),
-         handler = std::move(handler)](NCUpdateResult result) {
-            if (const auto self = weak.lock()) {
-                --self->_requestsRunning;
-                self->_schedule->didAnswer(result != NCUpdateResult::Failed);
-            }
-            if (handler)
-                handler(result);
-        });
+    _widget->requestUpdate([weak = std::weak_ptr<WidgetHost>(strong(this)),
+                            handler = std::move(handler)](NCUpdateResult result) {
+        if (const auto self = weak.lock()) {
+            --self->_requestsRunning;
+            self->_schedule->didAnswer(result != NCUpdateResult::Failed);
+        }
+        if (handler)
+            handler(result);
+    });
 }
 
 // What happens around it
@@ -383,8 +327,7 @@ void WidgetHost::setTraits(const UITraitCollection& traits) {
             NSNotificationCenter::defaultCenter()->postNotificationName_object(
                 UIContentSizeCategoryDidChangeNotification, nullptr);
         }
-        if (_controller->isViewLoaded())
-            outermost(_controller->view())->_traitsDidChange(previous);
+        _widget->traitsDidChange(previous);
     }
     updateContentSize();
 }
@@ -398,19 +341,18 @@ void WidgetHost::networkDidChange() {
 }
 
 void WidgetHost::didReceiveMemoryWarning() {
-    _controller->didReceiveMemoryWarning();
+    controller()->didReceiveMemoryWarning();
 }
 
 void WidgetHost::startWidgetAnew() {
     {
         const Hold hold(*this);
-        const bool wasLoaded = _controller->isViewLoaded();
+        const bool wasLoaded = _widget->isLoaded();
         const auto size = _contentSize;
-        letGoOfController();
+        _widget->end();
         _schedule->setVisible(false);
         _visible = false;
-        _prefersHeight = false;
-        makeController();
+        makeWidget();
         if (wasLoaded)
             loadView();
         _contentSize = size; // another one is a change that the presenter must hear of

@@ -17,6 +17,7 @@ class UIView;
 class UIViewController;
 class WidgetPresenter;
 class WidgetUpdateSchedule;
+class _HeldWidget;
 class _WidgetContext;
 
 /// What a host is told at its beginning.
@@ -65,9 +66,7 @@ public:
         return _extensionDescription;
     }
     /// Another one after `startWidgetAnew`.
-    [[nodiscard]] const std::shared_ptr<UIViewController>& controller() const noexcept {
-        return _controller;
-    }
+    [[nodiscard]] const std::shared_ptr<UIViewController>& controller() const noexcept;
     /// Held weakly. Without one a change of size happens at once.
     void setPresenter(const std::shared_ptr<WidgetPresenter>& presenter) { _presenter = presenter; }
 
@@ -124,13 +123,11 @@ private:
 
     void _initWithExtension_settings(const Extension& extension,
                                      const WidgetHostSettings& settings);
-    void makeController();
-    void letGoOfController();
+    void makeWidget();
     void loadView();
     void updateVisibility();
     void updateMaxima(UIContentSizeCategory category);
     [[nodiscard]] CGFloat heightLimit() const;
-    [[nodiscard]] CGFloat shownHeight() const;
     void updateContentSize();
     void transitionTo(CGSize size);
     void showMode(NCWidgetDisplayMode mode);
@@ -141,8 +138,8 @@ private:
     ExtensionDescription _extensionDescription;
     std::function<std::shared_ptr<UIViewController>()> _makePrincipalObject;
     WidgetHostSettings _settings;
-    std::shared_ptr<UIViewController> _controller;
     std::shared_ptr<_WidgetContext> _context;
+    std::unique_ptr<_HeldWidget> _widget;
     std::shared_ptr<WidgetUpdateSchedule> _schedule;
     std::weak_ptr<WidgetPresenter> _presenter;
     std::function<void()> _contentTold;
@@ -151,7 +148,6 @@ private:
     CGSize _contentSize;
     std::size_t _requestsRunning = 0;
     int _holds = 0;
-    bool _prefersHeight = false; ///< the widget has said what it prefers
     bool _shown = false;
     bool _locked = false;
     bool _visible = false;
