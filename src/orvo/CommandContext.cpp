@@ -38,6 +38,10 @@ std::string cureOf(const NSError& error) {
                "add";
     case FavoritesError::CannotOpen:
         return "Make it readable or put a good copy in its place; to begin anew, move it away.";
+    case FavoritesError::CannotWrite:
+        return "Make the file and its folder writable.";
+    case FavoritesError::Locked:
+        return "Another program uses the file. Try again when that is done.";
     default:
         return {};
     }

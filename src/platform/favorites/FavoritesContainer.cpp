@@ -21,12 +21,18 @@ void FavoritesContainer::accessContentsUsingConcurrentBlock(
         [self = strong(this), block = std::move(block)] { block(self->contents()); });
 }
 
+std::shared_ptr<NSError> FavoritesContainer::unreadable() const {
+    const std::lock_guard lock(_mutex);
+    return _unreadable;
+}
+
 std::shared_ptr<NSArray> FavoritesContainer::contents() const {
     std::shared_ptr<NSError> error;
     auto favorites = _persister->favorites(&error);
     if (!favorites)
         Log::findOrCreate("Favorites")->error("%@", descriptionOf(error));
     const std::lock_guard lock(_mutex);
+    _unreadable = favorites ? nullptr : error;
     if (favorites)
         return _lastRead = favorites;
     return _lastRead ? _lastRead : NSArray::array();

@@ -20,12 +20,16 @@ public:
     void accessContentsUsingConcurrentBlock(
         std::function<void(const std::shared_ptr<NSArray>& favorites)> block) const;
 
+    /// Why the latest access could not read them; nil when it could, and before the first.
+    [[nodiscard]] std::shared_ptr<NSError> unreadable() const;
+
 private:
     [[nodiscard]] std::shared_ptr<NSArray> contents() const;
 
     std::shared_ptr<FavoritesPersister> _persister;
     mutable std::mutex _mutex;
     mutable std::shared_ptr<NSArray> _lastRead;
+    mutable std::shared_ptr<NSError> _unreadable;
 };
 
 } // namespace orvo

@@ -13,6 +13,7 @@ enum class FavoritesError : std::int64_t {
     CannotRead = 2,  ///< opened, but not to be read
     CannotWrite = 3, ///< nothing was changed
     NotFound = 4,    ///< no such favourite
+    Locked = 5,      ///< another program held the file all the while; nothing was changed
 };
 
 [[nodiscard]] std::shared_ptr<NSError> favoritesError(FavoritesError code, std::string message);

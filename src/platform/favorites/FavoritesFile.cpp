@@ -31,12 +31,6 @@ CREATE UNIQUE INDEX favorite_place ON favorite (name, latitude, longitude) WHERE
 PRAGMA user_version = 1;
 )";
 
-bool isThere(const std::filesystem::path& path) {
-    std::error_code ignored;
-    // A file without a byte is one that another process is about to lay out.
-    return std::filesystem::file_size(path, ignored) > 0 && !ignored;
-}
-
 } // namespace
 
 std::unique_ptr<SQLiteDatabase> FavoritesFile::open(const std::filesystem::path& path,
@@ -54,16 +48,33 @@ std::unique_ptr<SQLiteDatabase> FavoritesFile::open(const std::filesystem::path&
     if (!database && file._failure.isDamage() && damaged.setAside(file._failure.reason))
         database = attempt();
     if (!database && error)
-        *error = favoritesError(FavoritesError::CannotOpen,
+        *error = favoritesError(file.errorCode(),
                                 fmt::format("{}: the favorites cannot be opened: {}",
                                             path.string(),
                                             file._failure.reason));
     return database;
 }
 
+FavoritesError FavoritesFile::errorCode() const {
+    if (_failure.isLocked())
+        return FavoritesError::Locked;
+    return _failure.isReadOnly() ? FavoritesError::CannotWrite : FavoritesError::CannotOpen;
+}
+
+std::optional<bool> FavoritesFile::isThere() {
+    std::error_code reason;
+    const auto size = std::filesystem::file_size(_path, reason);
+    // A file without a byte is one that another process is about to lay out.
+    if (!reason || reason == std::errc::no_such_file_or_directory)
+        return !reason && size > 0;
+    _failure = {-1, reason.message()};
+    return std::nullopt;
+}
+
 std::unique_ptr<SQLiteDatabase> FavoritesFile::openForReading() {
-    if (!isThere(_path))
-        return openEmpty();
+    const auto isFile = isThere();
+    if (!isFile.value_or(false))
+        return isFile ? openEmpty() : nullptr;
     auto database = SQLiteDatabase::open(_path, SQLiteDatabase::Mode::Read, &_failure);
     if (!database || !isUsable(*database))
         return nullptr;
@@ -80,8 +91,9 @@ std::unique_ptr<SQLiteDatabase> FavoritesFile::openForWriting() {
 }
 
 std::unique_ptr<SQLiteDatabase> FavoritesFile::openCopy() {
-    if (!isThere(_path))
-        return openEmpty();
+    const auto isFile = isThere();
+    if (!isFile.value_or(false))
+        return isFile ? openEmpty() : nullptr;
     auto database = SQLiteDatabase::openInMemory(_path, &_failure);
     return database && isUsable(*database) && layOut(*database) ? std::move(database) : nullptr;
 }

@@ -1,7 +1,10 @@
 #pragma once
 
+#include "platform/favorites/FavoritesError.h"
 #include "platform/favorites/FavoritesStore.h"
 #include "platform/sqlite/SQLiteDatabase.h"
+
+#include <optional>
 
 namespace orvo {
 
@@ -20,6 +23,10 @@ private:
     explicit FavoritesFile(const std::filesystem::path& path)
         : _path(path) {}
 
+    /// False also for a file without content; nothing, and why in `_failure`, where that cannot be
+    /// known: favourites that are hidden are not none.
+    [[nodiscard]] std::optional<bool> isThere();
+    [[nodiscard]] FavoritesError errorCode() const;
     [[nodiscard]] std::unique_ptr<SQLiteDatabase> openForReading();
     [[nodiscard]] std::unique_ptr<SQLiteDatabase> openForWriting();
     [[nodiscard]] std::unique_ptr<SQLiteDatabase> openCopy();

@@ -224,7 +224,7 @@ std::shared_ptr<NSError> FavoritesStore::remove(std::int64_t number) {
 std::shared_ptr<NSError> FavoritesStore::failure(FavoritesError code) const {
     const char* what = code == FavoritesError::CannotRead ? "cannot be read" : "cannot be changed";
     return favoritesError(
-        code,
+        _database->failure().isLocked() ? FavoritesError::Locked : code,
         fmt::format("{}: the favorites {}: {}", _path.string(), what, _database->failure().reason));
 }
 

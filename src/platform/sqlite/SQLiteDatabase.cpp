@@ -10,8 +10,13 @@ namespace orvo {
 
 namespace {
 
-constexpr int BusyMilliseconds = 5000;
 constexpr const char* MemoryName = ":memory:";
+
+/// SQLite's result code without its extension.
+int primaryCode(int code) {
+    constexpr int mask = 0xff;
+    return code & mask;
+}
 
 /// What SQLite says, and the system's own reason where it had one.
 std::string reasonOf(sqlite3* handle, int code) {
@@ -46,8 +51,17 @@ bool hasJournal(const std::filesystem::path& path) {
 } // namespace
 
 bool SQLiteFailure::isDamage() const noexcept {
-    const int primary = code & 0xff;
+    const int primary = primaryCode(code);
     return primary == SQLITE_CORRUPT || primary == SQLITE_NOTADB;
+}
+
+bool SQLiteFailure::isLocked() const noexcept {
+    const int primary = primaryCode(code);
+    return primary == SQLITE_BUSY || primary == SQLITE_LOCKED;
+}
+
+bool SQLiteFailure::isReadOnly() const noexcept {
+    return primaryCode(code) == SQLITE_READONLY;
 }
 
 std::unique_ptr<SQLiteDatabase>
@@ -61,17 +75,24 @@ SQLiteDatabase::connect(const std::string& name, int flags, SQLiteFailure* failu
         return nullptr;
     }
     sqlite3_extended_result_codes(handle, 1);
-    sqlite3_busy_timeout(handle, BusyMilliseconds);
-    return std::unique_ptr<SQLiteDatabase>(new SQLiteDatabase(handle));
+    std::unique_ptr<SQLiteDatabase> database(new SQLiteDatabase(handle));
+    database->setPatience(Patience);
+    return database;
 }
 
-std::unique_ptr<SQLiteDatabase>
-SQLiteDatabase::open(const std::filesystem::path& path, Mode mode, SQLiteFailure* failure) {
+void SQLiteDatabase::setPatience(std::chrono::milliseconds patience) {
+    sqlite3_busy_timeout(_handle, static_cast<int>(patience.count()));
+}
+
+std::unique_ptr<SQLiteDatabase> SQLiteDatabase::open(const std::filesystem::path& path,
+                                                     Mode mode,
+                                                     SQLiteFailure* failure,
+                                                     std::chrono::milliseconds patience) {
     if (mode == Mode::Read)
-        return openForReading(path, failure);
+        return openForReading(path, failure, patience);
     auto database = connect(path.string(), SQLITE_OPEN_READWRITE | SQLITE_OPEN_CREATE, failure);
     // Full: what was committed outlives a power cut, too, not only the process.
-    if (database && !database->setUpJournal()) {
+    if (database && !database->setUpJournal(patience)) {
         if (failure)
             *failure = database->failure();
         return nullptr;
@@ -80,31 +101,41 @@ SQLiteDatabase::open(const std::filesystem::path& path, Mode mode, SQLiteFailure
 }
 
 std::unique_ptr<SQLiteDatabase> SQLiteDatabase::openForReading(const std::filesystem::path& path,
-                                                               SQLiteFailure* failure) {
+                                                               SQLiteFailure* failure,
+                                                               std::chrono::milliseconds patience) {
     auto database = connect(path.string(), SQLITE_OPEN_READONLY, failure);
-    if (!database || database->userVersion())
+    if (!database)
+        return nullptr;
+    database->setPatience(patience);
+    if (database->userVersion())
         return database;
+    if (database->failure().isLocked()) { // whoever asked again would wait as long again
+        if (failure)
+            *failure = database->failure();
+        return nullptr;
+    }
     // Who reads a write-ahead log needs files beside it. Where none can be made, nobody else
     // writes either, and the file itself has all when no journal lies beside it.
-    constexpr int primaryCode = 0xff;
-    const int code = database->failure().code & primaryCode;
+    const int code = primaryCode(database->failure().code);
     if ((code != SQLITE_CANTOPEN && code != SQLITE_READONLY) || hasJournal(path))
         return database;
     return connect(immutableName(path), SQLITE_OPEN_READONLY | SQLITE_OPEN_URI, failure);
 }
 
-bool SQLiteDatabase::setUpJournal() {
-    // Who changes the journal's mode needs the file alone, and is told at once, not after the busy
-    // time, that it is not.
+bool SQLiteDatabase::setUpJournal(std::chrono::milliseconds patience) {
+    // Who changes the journal's mode needs the file alone, and is mostly told at once that it is
+    // not; but whoever holds the file exclusively makes each try take the whole busy time. So the
+    // tries do not wait, and what lies between them does.
+    using Clock = std::chrono::steady_clock;
     constexpr int pause = 10; // milliseconds
-    for (int waited = 0; !execute("PRAGMA journal_mode = WAL; PRAGMA synchronous = FULL");
-         waited += pause) {
-        constexpr int primaryCode = 0xff;
-        if ((_failure.code & primaryCode) != SQLITE_BUSY || waited >= BusyMilliseconds)
-            return false;
+    setPatience({});
+    const auto deadline = Clock::now() + patience;
+    bool isSetUp = false;
+    while (!(isSetUp = execute("PRAGMA journal_mode = WAL; PRAGMA synchronous = FULL")) &&
+           _failure.isLocked() && Clock::now() < deadline)
         sqlite3_sleep(pause);
-    }
-    return true;
+    setPatience(patience);
+    return isSetUp;
 }
 
 std::unique_ptr<SQLiteDatabase>

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <chrono>
 #include <cstdint>
 #include <filesystem>
 #include <memory>
@@ -17,21 +18,30 @@ struct SQLiteFailure {
 
     /// Whether the file itself is no good: no database, or a damaged one.
     [[nodiscard]] bool isDamage() const noexcept;
+    /// Whether another connection, mostly another program's, held the file all the while.
+    [[nodiscard]] bool isLocked() const noexcept;
+    /// Whether the file, or its folder, must not be written to.
+    [[nodiscard]] bool isReadOnly() const noexcept;
 };
 
-/// One connection to an SQLite file. One thread at a time. Waits up to five seconds for a lock that
-/// another connection holds.
+/// One connection to an SQLite file. One thread at a time. Each call waits for a lock that another
+/// connection holds, as long as the connection was told to when it was opened.
 class SQLiteDatabase final {
 public:
+    static constexpr std::chrono::milliseconds Patience = std::chrono::seconds(5);
+
     enum class Mode {
         Read,  ///< the file must be there; its folder may be one that nobody can write to
         Write, ///< made where it is not there; its folder must be. Journal: write-ahead log
     };
 
-    /// Nil, and why, where the file cannot be opened. A file that is no database is often found out
-    /// only by the first statement.
+    /// Nil, and why, where the file cannot be opened or stays locked. A file that is no database is
+    /// often found out only by the first statement.
     [[nodiscard]] static std::unique_ptr<SQLiteDatabase>
-    open(const std::filesystem::path& path, Mode mode, SQLiteFailure* failure);
+    open(const std::filesystem::path& path,
+         Mode mode,
+         SQLiteFailure* failure,
+         std::chrono::milliseconds patience = Patience);
     /// An empty database in memory, or with a path, a copy of what the file holds; the file must be
     /// there and is not changed.
     [[nodiscard]] static std::unique_ptr<SQLiteDatabase>
@@ -60,9 +70,12 @@ public:
 
 private:
     explicit SQLiteDatabase(sqlite3* handle);
-    [[nodiscard]] bool setUpJournal();
+    void setPatience(std::chrono::milliseconds patience);
+    [[nodiscard]] bool setUpJournal(std::chrono::milliseconds patience);
     [[nodiscard]] static std::unique_ptr<SQLiteDatabase>
-    openForReading(const std::filesystem::path& path, SQLiteFailure* failure);
+    openForReading(const std::filesystem::path& path,
+                   SQLiteFailure* failure,
+                   std::chrono::milliseconds patience);
     [[nodiscard]] static std::unique_ptr<SQLiteDatabase>
     connect(const std::string& name, int flags, SQLiteFailure* failure);
 

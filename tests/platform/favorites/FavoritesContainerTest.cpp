@@ -88,8 +88,22 @@ TEST(FavoritesContainer, AFailedReadGivesWhatWasReadLastAndIsLogged) {
     persister->answers = {array};
     const auto container = FavoritesContainer::initWithPersister(persister);
     EXPECT_EQ(contents(*container), array);
+    EXPECT_EQ(container->unreadable(), nullptr);
     EXPECT_EQ(contents(*container), array);
     EXPECT_THAT(log.messages(), ElementsAre("Error Domain=Test Code=1 \"the disk is gone\""));
+}
+
+TEST(FavoritesContainer, TellsWhyTheLatestReadFailedUntilOneSucceeds) {
+    const testing::LogCapture log;
+    const auto persister = std::make_shared<QueuedPersister>();
+    const auto container = FavoritesContainer::initWithPersister(persister);
+    EXPECT_EQ(container->unreadable(), nullptr);
+    (void)contents(*container);
+    ASSERT_NE(container->unreadable(), nullptr);
+    EXPECT_EQ(container->unreadable()->localizedDescription(), "the disk is gone");
+    persister->answers = {NSArray::array()};
+    (void)contents(*container);
+    EXPECT_EQ(container->unreadable(), nullptr);
 }
 
 TEST(FavoritesContainer, WithoutAnyReadThatSucceededThereAreNoFavorites) {

@@ -13,6 +13,7 @@
 
 #include <algorithm>
 #include <fstream>
+#include <map>
 
 namespace orvo {
 namespace {
@@ -368,6 +369,35 @@ TEST_F(FavoritesStoreTest, AFolderThatCannotBeMadeIsAnErrorThatNamesIt) {
     ASSERT_NE(error, nullptr);
     EXPECT_THAT(error->localizedDescription(), HasSubstr(path().string()));
     EXPECT_THAT(error->localizedDescription(), HasSubstr("/data: File exists"));
+}
+
+TEST_F(FavoritesStoreTest, AFileThatIsHiddenIsNotNone) {
+    const auto tooLong = _folder.path() / std::string(300, 'x') / "favorites.sqlite";
+    std::filesystem::create_symlink("loop", _folder.path() / "loop");
+    const std::map<std::filesystem::path, std::string> reasons{
+        {tooLong, "File name too long"},
+        {_folder.path() / "loop" / "favorites.sqlite", "Too many levels of symbolic links"},
+        {_folder.path(), "Is a directory"}};
+    for (const bool inMemory : {false, true}) {
+        const auto kept = Environment::keepsWritesInMemory().overrideWith(inMemory);
+        for (const auto& [hidden, reason] : reasons) {
+            std::shared_ptr<NSError> error;
+            EXPECT_EQ(FavoritesStore::open(hidden, FavoritesStore::Access::Read, &error), nullptr);
+            ASSERT_NE(error, nullptr) << hidden;
+            EXPECT_EQ(error->code(), static_cast<std::int64_t>(FavoritesError::CannotOpen));
+            EXPECT_EQ(error->localizedDescription(),
+                      hidden.string() + ": the favorites cannot be opened: " + reason);
+        }
+    }
+}
+
+TEST_F(FavoritesStoreTest, AStoreThatWasOpenedForReadingCannotBeChanged) {
+    addLines(*open(), {"a"});
+    const auto store = open(FavoritesStore::Access::Read);
+    const auto error = store->addLine(*favoriteLine(1, "b"));
+    ASSERT_NE(error, nullptr);
+    EXPECT_EQ(error->code(), static_cast<std::int64_t>(FavoritesError::CannotWrite));
+    EXPECT_THAT(names(*store), ElementsAre("a"));
 }
 
 TEST_F(FavoritesStoreTest, AReadThatFailsIsAnErrorThatNamesFileAndReason) {

@@ -5,6 +5,7 @@
 
 #include <gtest/gtest.h>
 
+#include <chrono>
 #include <fstream>
 #include <limits>
 
@@ -132,6 +133,41 @@ TEST_F(SQLiteDatabaseTest, KnowsDamage) {
     EXPECT_TRUE(database->failure().isDamage());
     EXPECT_EQ(SQLiteDatabase::openInMemory(path(), &_failure), nullptr);
     EXPECT_TRUE(_failure.isDamage());
+}
+
+TEST_F(SQLiteDatabaseTest, AFileThatAnotherHoldsExclusivelyIsGivenUpInTime) {
+    const auto holder = withTable();
+    ASSERT_TRUE(holder->execute("PRAGMA locking_mode = EXCLUSIVE; BEGIN EXCLUSIVE;"
+                                "INSERT INTO t VALUES (1, 2)"));
+    constexpr std::chrono::milliseconds Short(30);
+    for (const auto mode : {SQLiteDatabase::Mode::Write, SQLiteDatabase::Mode::Read}) {
+        const auto begin = std::chrono::steady_clock::now();
+        EXPECT_EQ(SQLiteDatabase::open(path(), mode, &_failure, Short), nullptr);
+        EXPECT_LT(std::chrono::steady_clock::now() - begin, SQLiteDatabase::Patience);
+        EXPECT_TRUE(_failure.isLocked()) << _failure.reason;
+        EXPECT_FALSE(_failure.isDamage());
+        EXPECT_EQ(_failure.reason, "database is locked");
+    }
+}
+
+TEST_F(SQLiteDatabaseTest, AWriterWaitsAsLongAsItWasToldAtItsOpening) {
+    const auto holder = withTable();
+    constexpr std::chrono::milliseconds Short(30);
+    const auto writer = SQLiteDatabase::open(path(), SQLiteDatabase::Mode::Write, &_failure, Short);
+    ASSERT_NE(writer, nullptr) << _failure.reason;
+    const SQLiteTransaction first(*holder);
+    const auto begin = std::chrono::steady_clock::now();
+    EXPECT_FALSE(SQLiteTransaction(*writer).isOpen());
+    EXPECT_LT(std::chrono::steady_clock::now() - begin, SQLiteDatabase::Patience);
+    EXPECT_TRUE(writer->failure().isLocked());
+}
+
+TEST_F(SQLiteDatabaseTest, KnowsAFileThatMustNotBeWritten) {
+    withTable();
+    const auto reader = open(SQLiteDatabase::Mode::Read);
+    EXPECT_FALSE(reader->execute("INSERT INTO t VALUES (1, 2)"));
+    EXPECT_TRUE(reader->failure().isReadOnly());
+    EXPECT_FALSE(reader->failure().isLocked());
 }
 
 TEST_F(SQLiteDatabaseTest, IsSoundWithItsLayoutNumber) {

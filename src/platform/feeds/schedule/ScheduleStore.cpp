@@ -12,6 +12,7 @@
 #include "platform/foundation/NSDate.h"
 #include "platform/foundation/Text.h"
 
+#include <chrono>
 #include <functional>
 #include <mutex>
 #include <utility>
@@ -20,8 +21,8 @@ namespace orvo {
 
 namespace {
 
-constexpr int ReaderPatience = 5;  // seconds
-constexpr int WriterPatience = 60; // another import may be writing
+constexpr std::chrono::seconds ReaderPatience(5);
+constexpr std::chrono::seconds WriterPatience(60); // another import may be writing
 
 double now() {
     return Environment::wallClock().get()->timeIntervalSinceReferenceDate() +

@@ -2,7 +2,6 @@
 
 #include "platform/feeds/schedule/ScheduleError.h"
 
-#include <fmt/format.h>
 #include <string>
 #include <system_error>
 #include <utility>
@@ -125,11 +124,14 @@ std::shared_ptr<NSError> failureOf(const SQLiteFailure& failure,
     std::string message = path.string() + ": " + failure.reason;
     if (failure.isDamage())
         message += "; move it away and run “orvo feeds update”";
+    if (failure.isLocked())
+        message += " by another program; try again when that is done";
     return scheduleError(ScheduleErrorCode::Store, std::move(message));
 }
 
-std::unique_ptr<SQLiteDatabase>
-openForWriting(const std::filesystem::path& path, int patience, std::shared_ptr<NSError>& error) {
+std::unique_ptr<SQLiteDatabase> openForWriting(const std::filesystem::path& path,
+                                               std::chrono::seconds patience,
+                                               std::shared_ptr<NSError>& error) {
     std::error_code unmade;
     std::filesystem::create_directories(path.parent_path(), unmade);
     if (unmade) {
@@ -138,20 +140,20 @@ openForWriting(const std::filesystem::path& path, int patience, std::shared_ptr<
         return nullptr;
     }
     SQLiteFailure failure;
-    auto database = SQLiteDatabase::open(path, SQLiteDatabase::Mode::Write, &failure);
-    const std::string wait = fmt::format("PRAGMA busy_timeout = {}", patience * 1000);
-    if (!database || !database->execute(wait.c_str()))
-        error = failureOf(database ? database->failure() : failure, path);
-    else
-        error = prepare(*database, path);
+    auto database = SQLiteDatabase::open(path, SQLiteDatabase::Mode::Write, &failure, patience);
+    error = database ? prepare(*database, path) : failureOf(failure, path);
     return error ? nullptr : std::move(database);
 }
 
 std::unique_ptr<SQLiteDatabase> openForReading(const std::filesystem::path& path,
                                                std::shared_ptr<NSError>& error) {
-    std::error_code ignored;
-    if (!std::filesystem::exists(path, ignored))
+    std::error_code unknown;
+    if (!std::filesystem::exists(path, unknown)) {
+        if (unknown) // something hides it, or stands in its way
+            error =
+                scheduleError(ScheduleErrorCode::Store, path.string() + ": " + unknown.message());
         return nullptr;
+    }
     SQLiteFailure failure;
     auto database = SQLiteDatabase::open(path, SQLiteDatabase::Mode::Read, &failure);
     if (!database) {

@@ -3,6 +3,7 @@
 #include "platform/foundation/NSError.h"
 #include "platform/sqlite/SQLiteDatabase.h"
 
+#include <chrono>
 #include <filesystem>
 #include <memory>
 #include <optional>
@@ -17,10 +18,11 @@ namespace ScheduleTables {
                                                  const std::filesystem::path& path);
 
 /// Opens the file for writing, and makes it, its folder and the tables when missing. Any number of
-/// processes may do so at once. Waits up to `patience` seconds for other writers.
+/// processes may do so at once. Waits up to `patience` for other writers.
 /// @return nil, with the reason in `error`: it cannot be opened, or was written by a later version
-[[nodiscard]] std::unique_ptr<SQLiteDatabase>
-openForWriting(const std::filesystem::path& path, int patience, std::shared_ptr<NSError>& error);
+[[nodiscard]] std::unique_ptr<SQLiteDatabase> openForWriting(const std::filesystem::path& path,
+                                                             std::chrono::seconds patience,
+                                                             std::shared_ptr<NSError>& error);
 
 /// Opens the file for reading only.
 /// @return nil without an error when there is no file, or one that has no tables yet

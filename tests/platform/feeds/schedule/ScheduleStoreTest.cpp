@@ -2,6 +2,7 @@
 
 #include "TestSchedules.h"
 #include "platform/feeds/schedule/ScheduleError.h"
+#include "platform/feeds/schedule/ScheduleTables.h"
 #include "platform/foundation/Exceptions.h"
 #include "platform/foundation/Text.h"
 #include "platform/sqlite/SQLiteDatabase.h"
@@ -305,6 +306,30 @@ TEST_F(ScheduleStoreTest, AFileThatWasCutIsAnErrorAndNotAnEmptyStore) {
     ASSERT_TRUE(error);
     EXPECT_THAT(error->localizedDescription(), HasSubstr(path().string() + ": "));
     EXPECT_THAT(error->localizedDescription(), HasSubstr("orvo feeds update"));
+}
+
+TEST_F(ScheduleStoreTest, AStoreThatIsHiddenIsAnErrorAlsoWhereNothingIsWritten) {
+    const auto hidden = path().parent_path() / std::string(300, 'x') / "schedules.sqlite";
+    for (const bool inMemory : {false, true}) {
+        const auto kept = Environment::keepsWritesInMemory().overrideWith(inMemory);
+        error = nullptr;
+        EXPECT_EQ(ScheduleStore::open(hidden, &error), nullptr);
+        ASSERT_TRUE(error);
+        EXPECT_THAT(error->localizedDescription(), HasSubstr("File name too long"));
+    }
+}
+
+TEST_F(ScheduleStoreTest, AStoreThatAnotherProgramHoldsIsAnErrorThatSaysSo) {
+    ASSERT_EQ(import(testing::smallSchedule()), "");
+    store = nullptr;
+    const auto other = SQLiteDatabase::open(path(), SQLiteDatabase::Mode::Write, nullptr);
+    ASSERT_TRUE(other->execute("PRAGMA locking_mode = EXCLUSIVE; BEGIN EXCLUSIVE;"
+                               "UPDATE line SET long_name = ''"));
+    EXPECT_EQ(ScheduleTables::openForWriting(path(), std::chrono::seconds(0), error), nullptr);
+    ASSERT_TRUE(error);
+    EXPECT_EQ(error->localizedDescription(),
+              path().string() +
+                  ": database is locked by another program; try again when that is done");
 }
 
 TEST_F(ScheduleStoreTest, NamesThatCouldNotBeTranslatedOnceAreTranslatedLater) {
