@@ -10,9 +10,13 @@ namespace orvo {
 namespace {
 
 constexpr std::uint64_t EndOfYear9999 = 253'402'300'799;
-/// Some feeds mean "open" by the last year that their calendar knows, in seconds. Read as
-/// milliseconds it would be a day in 1978.
+/// Some feeds mean "open" by the last year that their calendar knows, in seconds, up to its end
+/// somewhere on earth. Read as milliseconds it would be a day in 1978.
 constexpr std::uint64_t BeginningOfYear9999 = 253'370'764'800;
+constexpr std::uint64_t LongestDay = 26ULL * 60 * 60; // the end of a day comes up to 26 hours late
+/// Below 0, published as what the same bits are without a sign. Some feeds mean "open" by -1, or by
+/// the first year that their calendar knows.
+constexpr std::uint64_t Negative = 1ULL << 63U;
 constexpr std::int64_t LeastGap = 60;
 constexpr double Horizon = 24.0 * 60 * 60;
 
@@ -38,7 +42,8 @@ std::optional<std::int64_t> moment(std::optional<std::uint64_t> published) {
 }
 
 bool isLastYear(std::optional<std::uint64_t> published) {
-    return published && *published >= BeginningOfYear9999 && *published <= EndOfYear9999;
+    return published && *published >= BeginningOfYear9999 &&
+           *published <= EndOfYear9999 + LongestDay;
 }
 
 const std::vector<AlertPeriod>& publishedPeriods(const Alert& alert) {
@@ -54,7 +59,8 @@ namespace IncidentPeriods {
 std::optional<IncidentPeriod> fromPublished(const AlertPeriod& period) noexcept {
     const IncidentPeriod result{moment(period.start),
                                 isLastYear(period.end) ? std::nullopt : moment(period.end)};
-    const bool neverBegins = wholeSeconds(period.start.value_or(0)) > EndOfYear9999;
+    const std::uint64_t start = period.start.value_or(0);
+    const bool neverBegins = start < Negative && wholeSeconds(start) > EndOfYear9999;
     if (neverBegins || (result.start && result.end && *result.end <= *result.start))
         return std::nullopt;
     return result;

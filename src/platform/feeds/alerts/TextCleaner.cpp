@@ -5,6 +5,7 @@
 #include "platform/feeds/alerts/TagStripper.h"
 
 #include <unicode/ubrk.h>
+#include <unicode/uchar.h>
 #include <unicode/utext.h>
 #include <unicode/utf8.h>
 
@@ -39,9 +40,10 @@ class Tidier {
 public:
     explicit Tidier(std::size_t length) { _result.reserve(length); }
 
-    void add(CharacterKind kind, std::string_view character) {
-        switch (kind) {
+    void add(UChar32 c, std::string_view character) {
+        switch (kindOf(c)) {
         case CharacterKind::Visible:
+            _isSeen = _isSeen || !u_hasBinaryProperty(c, UCHAR_DEFAULT_IGNORABLE_CODE_POINT);
             return addVisible(character);
         case CharacterKind::Blank:
             _blank = " ";
@@ -60,7 +62,8 @@ public:
         }
     }
 
-    std::string take() { return std::move(_result); }
+    /// Characters that only join or part others are nothing by themselves.
+    std::string take() { return _isSeen ? std::move(_result) : std::string(); }
 
 private:
     void addVisible(std::string_view character) {
@@ -78,6 +81,7 @@ private:
     std::string _result;
     std::string_view _blank;
     std::size_t _lineBreaks = 0;
+    bool _isSeen = false;
 };
 
 std::string tidied(std::string_view text) {
@@ -91,8 +95,7 @@ std::string tidied(std::string_view text) {
         if (c == '\r' && (i == length || text[static_cast<std::size_t>(i)] != '\n'))
             c = '\n';
         tidier.add(
-            kindOf(c),
-            text.substr(static_cast<std::size_t>(begin), static_cast<std::size_t>(i - begin)));
+            c, text.substr(static_cast<std::size_t>(begin), static_cast<std::size_t>(i - begin)));
     }
     return tidier.take();
 }
@@ -185,7 +188,9 @@ std::string capped(std::string text, std::size_t most) {
     utext_openUTF8(&view, text.data(), length, &status);
     ubrk_setUText(characters.get(), &view, &status);
     if (U_SUCCESS(status) && !ubrk_isBoundary(characters.get(), cut))
-        cut = std::max(ubrk_preceding(characters.get(), cut), 0);
+        // What is left of a first character that is longer than all may be is better than nothing.
+        if (const auto before = ubrk_preceding(characters.get(), cut); before > 0)
+            cut = before;
     utext_close(&view);
     text.resize(static_cast<std::size_t>(cut));
     text.erase(std::min(text.size(), text.find_last_not_of(" \n") + 1));

@@ -16,7 +16,7 @@ inline constexpr std::size_t LongestText = 20'000;
 /// Plain text: tags stripped, character references decoded (twice where they were escaped twice),
 /// control characters and those that override the direction of writing dropped. Line breaks stay,
 /// at most one empty line in a row; runs of blanks become one; nothing blank stands at either end
-/// of a line. Empty for a text of blanks. `text` is valid UTF-8.
+/// of a line. Empty for a text in which nothing can be seen. `text` is valid UTF-8.
 [[nodiscard]] std::string clean(std::string_view text);
 
 /// `clean` and then `onOneLine`.
@@ -29,7 +29,8 @@ inline constexpr std::size_t LongestText = 20'000;
 [[nodiscard]] std::string_view firstParagraph(std::string_view cleanText) noexcept;
 
 /// The text, or as much of its beginning as is whole characters (as a reader sees them) and at most
-/// `most` Unicode characters. No blank stands at the cut.
+/// `most` Unicode characters; a first character that alone has more is cut. No blank stands at the
+/// cut.
 [[nodiscard]] std::string capped(std::string text, std::size_t most);
 
 } // namespace TextCleaner

@@ -60,12 +60,22 @@ TEST(IncidentPeriods, EndsAfterTheYear9999AreOpen) {
 TEST(IncidentPeriods, TheLastYearInSecondsIsOpenToo) {
     EXPECT_EQ(published(1, 253'402'300'799), (IncidentPeriod{1, Open}));
     EXPECT_EQ(published(1, 253'370'764'800), (IncidentPeriod{1, Open}));
+    EXPECT_EQ(published(1, 253'402'300'800), (IncidentPeriod{1, Open})); // at its very end
+    EXPECT_EQ(published(1, 253'402'300'799 + 12 * 3600), (IncidentPeriod{1, Open}));
+}
+
+TEST(IncidentPeriods, NegativeSidesAreOpen) {
+    constexpr auto firstYear = static_cast<std::uint64_t>(-62'135'596'800); // of our calendar
+    EXPECT_EQ(published(~0ULL, ~0ULL), (IncidentPeriod{Open, Open}));
+    EXPECT_EQ(published(firstYear, 5), (IncidentPeriod{Open, 5}));
+    EXPECT_EQ(published(5, firstYear), (IncidentPeriod{5, Open}));
 }
 
 TEST(IncidentPeriods, EmptyOnesAndThoseThatNeverBeginAreNone) {
     EXPECT_EQ(published(10, 10), std::nullopt);
     EXPECT_EQ(published(10, 9), std::nullopt);
-    EXPECT_EQ(published(~0ULL, 0), std::nullopt);
+    EXPECT_EQ(published(253'402'300'800'000, 0), std::nullopt);
+    EXPECT_EQ(published(~0ULL >> 1U, 0), std::nullopt);
 }
 
 TEST(IncidentPeriods, ImpactComesBeforeCommunicationBeforeActive) {

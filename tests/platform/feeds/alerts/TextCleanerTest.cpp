@@ -111,6 +111,20 @@ TEST(TextCleaner, CutsOnlyAtWholeCharacters) {
             Text::isValidUTF8(TextCleaner::capped("aé漢👨‍👩‍👧e\u0301z", most)));
 }
 
+TEST(TextCleaner, ACharacterWithoutEndIsCutAndNotLeftOut) {
+    const std::string tower = "e" + repeated("\u0301", 300);
+    EXPECT_EQ(TextCleaner::capped(tower, 200), "e" + repeated("\u0301", 199));
+    EXPECT_EQ(TextCleaner::capped("ab" + tower, 200), "ab");
+    EXPECT_EQ(TextCleaner::capped(tower, 0), "");
+}
+
+TEST(TextCleaner, ATextInWhichNothingCanBeSeenIsEmpty) {
+    EXPECT_EQ(clean("\u200B"), "");
+    EXPECT_EQ(clean("\u00AD \u2060\u200D\n\uFE0F"), "");
+    EXPECT_EQ(TextCleaner::cleanLine("<b>\u200B</b>"), "");
+    EXPECT_EQ(clean("a\u200Bb"), "a\u200Bb"); // where a long word may break
+}
+
 TEST(TextCleaner, NoBlankStandsAtTheCut) {
     EXPECT_EQ(TextCleaner::capped("one two three", 4), "one");
 }
