@@ -11,6 +11,7 @@
 #include <algorithm>
 #include <array>
 #include <cctype>
+#include <climits>
 #include <fmt/format.h>
 
 namespace orvo {
@@ -50,6 +51,18 @@ bool isHeaderName(std::string_view name) {
     });
 }
 
+/// Empty for a path that the system can be asked for.
+std::string problemOfPath(const std::filesystem::path& path) {
+    if (path.native().find('\0') != std::string::npos)
+        return "a path cannot hold a zero byte";
+    constexpr std::size_t Longest = PATH_MAX - 1;
+    const auto length = std::filesystem::absolute(path).native().size();
+    return length <= Longest
+               ? ""
+               : fmt::format(
+                     "a path of {} bytes is longer than the system permits ({})", length, Longest);
+}
+
 std::string problemOfLocation(const SourceRequest& request) {
     const auto shown = request.displayLocation();
     if (request.location.empty())
@@ -60,12 +73,12 @@ std::string problemOfLocation(const SourceRequest& request) {
         return HttpURL::normalized(request.location)
                    ? ""
                    : fmt::format("{}: this is no valid web address", shown);
+    const auto path = request.localPath();
+    if (path)
+        return problemOfPath(*path);
     if (isFileURL(request.location))
-        return request.localPath() ? ""
-                                   : fmt::format("{}: this names no file on this machine", shown);
-    if (!HttpURL::scheme(request.location).empty())
-        return fmt::format("{}: only http, https and file are understood", shown);
-    return "";
+        return fmt::format("{}: this names no file on this machine", shown);
+    return fmt::format("{}: only http, https and file are understood", shown);
 }
 
 std::string problemOfSecrets(const SourceRequest& request) {

@@ -11,13 +11,17 @@ namespace orvo {
 
 namespace {
 
-bool isText(std::string_view bytes) {
+enum class FieldBytes { Text, WithZero, NotUtf8 };
+
+FieldBytes look(std::string_view bytes) {
     const auto isPlain = [](char byte) {
         return byte > 0;
     };
     if (std::ranges::all_of(bytes, isPlain)) // nearly always
-        return true;
-    return bytes.find('\0') == std::string_view::npos && Text::isValidUTF8(bytes);
+        return FieldBytes::Text;
+    if (bytes.find('\0') != std::string_view::npos)
+        return FieldBytes::WithZero;
+    return Text::isValidUTF8(bytes) ? FieldBytes::Text : FieldBytes::NotUtf8;
 }
 
 bool isBlank(char character) {
@@ -161,9 +165,14 @@ void CsvReader::endField(bool isQuoted, std::shared_ptr<NSError>& error) {
             _row.pop_back();
     _ends.push_back(_row.size());
     _fieldIsQuoted = false;
-    if (_ends.size() > MaximumFields)
+    if (_ends.size() > MaximumFields) {
         error = refusal("the row has more fields than a row may have (4096)");
-    else if (!isText(std::string_view(_row).substr(begin)))
+        return;
+    }
+    const auto found = look(std::string_view(_row).substr(begin));
+    if (found == FieldBytes::WithZero)
+        error = refusal("a byte is 0, which text has none of; UTF-16 needs its byte-order mark");
+    else if (found == FieldBytes::NotUtf8)
         error = refusal("the text is not UTF-8");
 }
 

@@ -127,6 +127,13 @@ std::vector<ArchiveEntry> listEntries(const ZipLibrary& library, zip_t* zip) {
     return entries;
 }
 
+std::string whyClosed(const ZipLibrary& library, zip_error_t* failure) {
+    const int code = library.errorCodeZip(failure);
+    if (code == ZIP_ER_NOPASSWD || code == ZIP_ER_ENCRNOTSUPP)
+        return "is encrypted; only archives without a password can be read";
+    return fmt::format("cannot be opened: {}", library.errorText(failure));
+}
+
 } // namespace
 
 ZipScheduleArchive::ZipScheduleArchive(ArchiveLayout layout,
@@ -174,10 +181,9 @@ ZipScheduleArchive::openFile(std::string_view file, std::shared_ptr<NSError>& er
     const auto& library = _zip->library;
     zip_file_t* opened = library.openFile(_zip->handle, layout().entry(file)->number, 0);
     if (!opened) {
-        error = scheduleError(ScheduleErrorCode::CannotRead,
-                              fmt::format("{}: cannot be opened: {}",
-                                          name,
-                                          library.errorText(library.archiveError(_zip->handle))));
+        error = scheduleError(
+            ScheduleErrorCode::CannotRead,
+            fmt::format("{}: {}", name, whyClosed(library, library.archiveError(_zip->handle))));
         return nullptr;
     }
     return std::make_unique<ZipStream>(library, opened, name);

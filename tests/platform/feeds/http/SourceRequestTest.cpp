@@ -59,6 +59,24 @@ TEST(SourceRequest, BadLocationsAreNamedWithTheReason) {
     EXPECT_EQ(at("").problem()->domain(), SourceErrorDomain);
 }
 
+TEST(SourceRequest, APathLongerThanTheSystemPermitsIsToldByItsLength) {
+    const auto pathOf = [](std::size_t length) {
+        return "/" + std::string(length - 1, 'a');
+    };
+    EXPECT_EQ(problemOf(at(pathOf(4095))), "");
+    EXPECT_EQ(problemOf(at(pathOf(4096))),
+              "a path of 4096 bytes is longer than the system permits (4095)");
+    EXPECT_EQ(problemOf(at("file://" + pathOf(4095))), "");
+    EXPECT_EQ(problemOf(at("file://" + pathOf(6000))),
+              "a path of 6000 bytes is longer than the system permits (4095)");
+    const auto relative = problemOf(at(pathOf(4095).substr(1)));
+    EXPECT_NE(relative.find(" bytes is longer than the system permits"), std::string::npos);
+}
+
+TEST(SourceRequest, APathEndsAtNoZeroByte) {
+    EXPECT_EQ(problemOf(at("file:///tmp/a.zip%00.txt")), "a path cannot hold a zero byte");
+}
+
 TEST(SourceRequest, HeadersCannotSmuggleOthers) {
     auto request = at("https://example.org/");
     request.headers = {{"X-Api-Key", "abc\r\nHost: evil"}};

@@ -95,10 +95,16 @@ TEST(CsvReader, RefusesAQuoteThatIsNeverClosedNamingTheRow) {
 TEST(CsvReader, RefusesWhatIsNotUtf8NamingTheRow) {
     const std::string latin1 = "a\nb\nZ\xFCrich\n";
     EXPECT_EQ(readAll(latin1).error, "routes.txt, row 3: the text is not UTF-8");
-    EXPECT_EQ(readAll(std::string("a\nb\0c\n", 6)).error,
-              "routes.txt, row 2: the text is not UTF-8");
     EXPECT_EQ(readAll("\"\xC3\",\xA9\n").error, "routes.txt, row 1: the text is not UTF-8");
     EXPECT_EQ(readAll("\xED\xA0\x80\n").error, "routes.txt, row 1: the text is not UTF-8");
+}
+
+TEST(CsvReader, RefusesAZeroByteNamingTheRowAndWhatItMayMean) {
+    const std::string reason =
+        "a byte is 0, which text has none of; UTF-16 needs its byte-order mark";
+    EXPECT_EQ(readAll(std::string("a\nb\0c\n", 6)).error, "routes.txt, row 2: " + reason);
+    EXPECT_EQ(readAll(std::string("\"\0\"\n", 4)).error, "routes.txt, row 1: " + reason);
+    EXPECT_EQ(readAll(std::string("a\0\n\0", 4)).error, "routes.txt, row 1: " + reason);
 }
 
 TEST(CsvReader, RefusesARowThatIsTooLong) {

@@ -122,6 +122,21 @@ TEST_F(ScheduleArchiveTest, AZipFileCutAnywhereIsRefusedOrFailsWhileRead) {
     }
 }
 
+TEST_F(ScheduleArchiveTest, AnEncryptedFileIsSaidToBeOne) {
+    const auto bytes = testing::zipOf(testing::smallSchedule());
+    std::string encrypted(bytes->stringView());
+    constexpr std::size_t Flags = 8; // of an entry of the directory
+    for (auto entry = encrypted.find("PK\x01\x02"); entry != std::string::npos;
+         entry = encrypted.find("PK\x01\x02", entry + 1))
+        encrypted[entry + Flags] |= 1;
+    const auto archive = openBytes(encrypted);
+    ASSERT_TRUE(archive) << message();
+    EXPECT_FALSE(archive->openFile("routes.txt", error));
+    EXPECT_EQ(message(),
+              "city.zip: routes.txt: is encrypted; only archives without a password can be read");
+    EXPECT_EQ(code(), ScheduleErrorCode::CannotRead);
+}
+
 TEST_F(ScheduleArchiveTest, ADamagedFileFailsWhileItIsRead) {
     const auto bytes = testing::zipOf(testing::smallSchedule());
     std::vector<std::uint8_t> damaged(bytes->bytes().begin(), bytes->bytes().end());
