@@ -14,6 +14,9 @@ inline constexpr const char* StepFreeKey = "Orvo.travel.stepFree";
 
 /// Whether incidents of lifts and ramps count. Default: no.
 [[nodiscard]] bool asksForStepFree();
+/// Why the answer may not be the person's: what they chose is there and cannot be read. Nil
+/// otherwise.
+[[nodiscard]] std::shared_ptr<NSError> unreadable();
 /// Nil, or why it could not be kept.
 std::shared_ptr<NSError> setAsksForStepFree(bool stepFree);
 

@@ -88,8 +88,14 @@ std::shared_ptr<NSData> read(const std::filesystem::path& path, std::shared_ptr<
         setError(error, path, errno);
         return nullptr;
     }
+    if (S_ISDIR(status.st_mode)) {
+        setError(error, path, EISDIR);
+        return nullptr;
+    }
     if (!S_ISREG(status.st_mode)) {
-        setError(error, path, S_ISDIR(status.st_mode) ? EISDIR : EINVAL);
+        if (error)
+            *error = NSError::errorWithMessage(
+                NSPOSIXErrorDomain, EINVAL, path.string() + ": is no regular file");
         return nullptr;
     }
     std::vector<std::uint8_t> bytes;

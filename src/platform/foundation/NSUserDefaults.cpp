@@ -179,6 +179,17 @@ std::shared_ptr<NSDictionary> NSUserDefaults::dictionaryRepresentation() const {
     return readDefaults(path, true);
 }
 
+std::shared_ptr<NSError> NSUserDefaults::unreadable() const {
+    const auto path = _path();
+    const auto stored = storedDefaults(path);
+    if (!stored.damage)
+        return stored.unreadable;
+    return NSError::errorWithMessage(PropertyList::ErrorDomain,
+                                     stored.damage->code(),
+                                     path.string() +
+                                         " is damaged: " + stored.damage->localizedDescription());
+}
+
 std::shared_ptr<NSObject> NSUserDefaults::objectForKey(const std::string& key) const {
     return dictionaryRepresentation()->objectForKey(key);
 }

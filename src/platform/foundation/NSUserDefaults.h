@@ -45,6 +45,10 @@ public:
     /// All keys and values, in the order in which they were first set.
     [[nodiscard]] std::shared_ptr<NSDictionary> dictionaryRepresentation() const;
 
+    /// Why what is kept counts as empty though a file is there: it cannot be read, or is damaged
+    /// and stays where it is. Nil otherwise, also without a file.
+    [[nodiscard]] std::shared_ptr<NSError> unreadable() const;
+
     /// Nil removes. A write that fails leaves the file as it was; the error says file and reason,
     /// nil when all went well.
     /// @throws NSInvalidArgumentException for an object that no property list can hold

@@ -68,6 +68,7 @@ TEST_F(AtomicFileTest, AFolderOrAPipeIsAnErrorThatNamesIt) {
     ASSERT_EQ(mkfifo(pipe.c_str(), 0600), 0);
     EXPECT_FALSE(AtomicFile::read(pipe, &error));
     EXPECT_EQ(error->code(), EINVAL);
+    EXPECT_EQ(error->localizedDescription(), pipe.string() + ": is no regular file");
 }
 
 TEST_F(AtomicFileTest, AWriteThatFailsLeavesTheFileAsItWas) {

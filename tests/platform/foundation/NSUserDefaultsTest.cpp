@@ -173,6 +173,12 @@ TEST_F(NSUserDefaultsTest, ADamagedFileIsSetAsideAndTheSettingsBeginAnew) {
     EXPECT_TRUE(defaults()->boolForKey("key"));
 }
 
+TEST_F(NSUserDefaultsTest, WhatCanBeReadOrIsNotThereIsNotUnreadable) {
+    EXPECT_FALSE(defaults()->unreadable());
+    defaults()->setBool_forKey(true, "key");
+    EXPECT_FALSE(defaults()->unreadable());
+}
+
 TEST_F(NSUserDefaultsTest, AListThatIsNoDictionaryIsDamaged) {
     const testing::LogCapture log;
     writeFile(std::string(PropertyList::write(*NSString::string("x"))->stringView()));
@@ -187,6 +193,9 @@ TEST_F(NSUserDefaultsTest, AFileThatCannotBeReadIsNeverWrittenOver) {
     EXPECT_EQ(log.messages(),
               (std::vector<std::string>{file().string() + " counts as empty: " + file().string() +
                                         ": Is a directory"}));
+    ASSERT_TRUE(defaults()->unreadable());
+    EXPECT_EQ(defaults()->unreadable()->localizedDescription(),
+              file().string() + ": Is a directory");
     const auto error = defaults()->setBool_forKey(true, "key");
     ASSERT_TRUE(error);
     EXPECT_EQ(error->localizedDescription(), file().string() + ": Is a directory");
@@ -234,6 +243,10 @@ TEST_F(NSUserDefaultsTest, ADamagedFileStaysWhereItIsWhileWritesAreKeptInMemory)
     EXPECT_FALSE(defaults()->setBool_forKey(true, "key"));
     EXPECT_TRUE(defaults()->boolForKey("key"));
     EXPECT_EQ(files(), (std::vector<std::string>{"group.com.zentu.Orvo.plist"}));
+    ASSERT_TRUE(defaults()->unreadable());
+    EXPECT_EQ(defaults()->unreadable()->localizedDescription(),
+              file().string() +
+                  " is damaged: property list, byte 0: the header bplist00 is missing");
 }
 
 TEST_F(NSUserDefaultsTest, ThreadsLoseNothingOfOneAnother) {
