@@ -40,6 +40,7 @@ set(MODULE_MAP
 set(THIRD_PARTY_MAP
   "qt: platform/foundation platform/uikit/text platform/uikit/drawing platform/uikit platform/extension platform/feeds/http platform/mapuikit platform/launchservices platform/demo platform/settings platform/extension/window orvo/window orvo"
   "unicode/: platform/foundation platform/uikit/text platform/feeds/schedule platform/feeds/alerts orvo/console"
+  "fontconfig/: platform/uikit/text"
   "sqlite3: platform/sqlite"
   "zip: platform/feeds/schedule platform/demo"
   "protozero/: platform/protobuf platform/feeds/alerts platform/demo"

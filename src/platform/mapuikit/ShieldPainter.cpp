@@ -72,10 +72,6 @@ Colours coloursOf(const TransitShieldDataSource& shield, bool nightMode) {
                                                                                : Qt::black};
 }
 
-QFont shieldFont() {
-    return ToolkitFonts::fontOf({.pointSize = LayoutPixels, .weight = QFont::DemiBold});
-}
-
 /// The text as a shape whose capitals stand `capHeight`-centred around y = 0, from x = 0.
 struct TextShape {
     QPainterPath path;
@@ -83,7 +79,8 @@ struct TextShape {
 };
 
 TextShape textShape(const QString& text, double height) {
-    const auto font = shieldFont();
+    const auto font =
+        ToolkitFonts::fontOf({.pointSize = LayoutPixels, .weight = QFont::DemiBold}, text);
     const QFontMetricsF metrics(font);
     QPainterPath path;
     path.addText(0, metrics.capHeight() / 2, font, text);

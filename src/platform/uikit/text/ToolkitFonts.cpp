@@ -1,63 +1,32 @@
 #include "platform/uikit/text/private/ToolkitFonts.h"
 
-#include <QFontDatabase>
+#include "platform/uikit/text/private/ProgramFonts.h"
+
 #include <QGuiApplication>
 #include <QTextOption>
 
 #include <algorithm>
-#include <array>
 #include <cmath>
 
 namespace orvo::ToolkitFonts {
-
-namespace {
-
-// Static faces: the toolkit emboldens the bold of the variable font a second time.
-struct Face {
-    int weight;
-    const char* path;
-};
-constexpr std::array Faces{Face{400, "/usr/share/fonts/opentype/inter/Inter-Regular.otf"},
-                           Face{500, "/usr/share/fonts/opentype/inter/Inter-Medium.otf"},
-                           Face{600, "/usr/share/fonts/opentype/inter/Inter-SemiBold.otf"},
-                           Face{700, "/usr/share/fonts/opentype/inter/Inter-Bold.otf"}};
-
-/// All are loaded when one is first used: whenever a face is added, the toolkit forgets every font
-/// that it has opened, and opens it again beside the one that a text still holds.
-std::array<QString, Faces.size()> loadedFamilies() {
-    std::array<QString, Faces.size()> families;
-    std::ranges::transform(Faces, families.begin(), [](const Face& face) {
-        const int identifier = QFontDatabase::addApplicationFont(face.path);
-        return QFontDatabase::applicationFontFamilies(identifier).value(0, "");
-    });
-    return families;
-}
-
-const QString& familyOf(std::size_t face) {
-    static const auto families = loadedFamilies();
-    return families.at(face);
-}
-
-std::size_t nearestFace(int weight) {
-    const auto* const nearest = std::ranges::min_element(
-        Faces, {}, [weight](const Face& face) { return std::abs(face.weight - weight); });
-    return static_cast<std::size_t>(nearest - Faces.begin());
-}
-
-} // namespace
 
 bool areAvailable() {
     return qobject_cast<QGuiApplication*>(QCoreApplication::instance()) != nullptr;
 }
 
 QFont fontOf(const FontFace& face) {
-    const auto nearest = nearestFace(face.weight);
-    QFont font(familyOf(nearest));
+    const auto& nearest = ProgramFonts::faceOf(face.weight);
+    QFont font(nearest.family);
     font.setPixelSize(std::max(1, static_cast<int>(std::lround(face.pointSize))));
-    font.setWeight(static_cast<QFont::Weight>(Faces.at(nearest).weight));
+    font.setWeight(static_cast<QFont::Weight>(nearest.weight));
     // With hinting, advances depend on the scale of the screen and on the machine's settings.
     font.setHintingPreference(QFont::PreferNoHinting);
     return font;
+}
+
+QFont fontOf(const FontFace& face, const QString& text) {
+    ProgramFonts::makeReadyFor(text);
+    return fontOf(face);
 }
 
 void layOut(QTextLayout& layout,
@@ -69,6 +38,7 @@ void layOut(QTextLayout& layout,
             QString::fromUtf8(text.data() + begin, static_cast<qsizetype>(end - begin)).size());
     };
     layout.setText(QString::fromUtf8(text.data(), static_cast<qsizetype>(text.size())));
+    ProgramFonts::makeReadyFor(layout.text());
     if (!runs.empty())
         layout.setFont(fontOf(runs.front().face));
     QList<QTextLayout::FormatRange> formats;
