@@ -62,6 +62,11 @@ std::shared_ptr<NSError> HandOffService::activateAction(const std::string& actio
     return handOff ? take({*handOff}, request) : error;
 }
 
+void HandOffService::busIsGone() {
+    if (_onBusGone)
+        _onBusGone();
+}
+
 std::shared_ptr<NSError> HandOffService::take(const std::vector<HandOff>& handOffs,
                                               const ApplicationRequest& request) const {
     _onRequest();

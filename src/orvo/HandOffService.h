@@ -32,6 +32,9 @@ public:
     activateAction(const std::string& action,
                    const std::shared_ptr<NSData>& parameter,
                    const ApplicationRequest& request) override;
+    void busIsGone() override;
+    /// What to do then; nothing at first.
+    void setOnBusGone(std::function<void()> onBusGone) { _onBusGone = std::move(onBusGone); }
 
 private:
     [[nodiscard]] std::shared_ptr<NSError> take(const std::vector<HandOff>& handOffs,
@@ -39,6 +42,7 @@ private:
 
     const Terminal& _terminal;
     std::function<void()> _onRequest;
+    std::function<void()> _onBusGone;
     HandOffWindows* _windows;
 };
 

@@ -22,17 +22,18 @@ std::optional<std::uint32_t> seconds(const std::string& text) {
     return result.ec == std::errc() && result.ptr == end ? std::optional(value) : std::nullopt;
 }
 
-/// Ends the main run loop when nothing was asked for some time, and no window is open.
+/// Ends the main run loop when nothing was asked for some time, or nobody can ask any more, and no
+/// window is open.
 class IdleEnd {
 public:
     /// `windows` may be nil.
     IdleEnd(std::uint32_t idleSeconds, const HandOffWindows* windows)
-        : _idleSeconds(idleSeconds) {
+        : _idleSeconds(idleSeconds)
+        , _windows(windows) {
         if (_idleSeconds > 0)
             _timer = NSTimer::scheduledTimerWithTimeInterval_repeats_block(
-                _idleSeconds, true, [windows](const std::shared_ptr<NSTimer>&) {
-                    if (!windows || !windows->isAnyOpen())
-                        RunLoop::main().stop();
+                _idleSeconds, true, [this](const std::shared_ptr<NSTimer>&) {
+                    endUnlessLookedAt();
                 });
     }
     IdleEnd(const IdleEnd&) = delete;
@@ -46,9 +47,25 @@ public:
         if (_timer)
             _timer->setFireDate(NSDate::dateWithTimeIntervalSinceNow(_idleSeconds));
     }
+    void busIsGone() {
+        _isBusGone = true;
+        endUnlessLookedAt();
+    }
+    void windowsAreClosed() const {
+        postpone();
+        if (_isBusGone)
+            endUnlessLookedAt();
+    }
 
 private:
+    void endUnlessLookedAt() const {
+        if (!_windows || !_windows->isAnyOpen())
+            RunLoop::main().stop();
+    }
+
     std::uint32_t _idleSeconds;
+    const HandOffWindows* _windows;
+    bool _isBusGone = false;
     std::shared_ptr<NSTimer> _timer;
 };
 
@@ -62,7 +79,7 @@ CommandSpec ServiceCommand::spec() const {
                 "starts it by itself where orvo is installed. On a display it shows each in a "
                 "window, on a terminal it tells each; everywhere it keeps the last one for: orvo "
                 "show. It ends when nothing has been asked of it for some time and no window is "
-                "open.",
+                "open, and with its bus.",
             .options = {{"idle",
                          "SECONDS",
                          fmt::format("after how long; {} if you say nothing, 0 for never",
@@ -78,11 +95,12 @@ ExitCode ServiceCommand::run(const Arguments& arguments, CommandContext& context
                                   "Write a number of seconds.");
     auto& loop = RunLoop::main();
     const auto windows = HandOffWindows::make();
-    const IdleEnd idleEnd(*idle, windows.get());
+    IdleEnd end(*idle, windows.get());
     HandOffService handler(
-        context.terminal(), [&] { idleEnd.postpone(); }, windows.get());
+        context.terminal(), [&] { end.postpone(); }, windows.get());
+    handler.setOnBusGone([&] { end.busIsGone(); });
     if (windows)
-        windows->setAllClosed([&] { idleEnd.postpone(); });
+        windows->setAllClosed([&] { end.windowsAreClosed(); });
     std::shared_ptr<NSError> error;
     const auto service =
         ApplicationService::start(HandOffReceiver::ApplicationIdentifier, handler, &error);

@@ -34,6 +34,8 @@ public:
     activateAction(const std::string& action,
                    const std::shared_ptr<NSData>& parameter,
                    const ApplicationRequest& request) = 0;
+    /// The bus is gone, as when the session ends: nobody can ask any more.
+    virtual void busIsGone() {}
 };
 
 } // namespace orvo

@@ -46,9 +46,21 @@ std::shared_ptr<NSData> dataOf(const QByteArray& bytes) {
 }
 
 class ApplicationObject final : public QDBusVirtualObject {
+    Q_OBJECT
+
 public:
     explicit ApplicationObject(ApplicationRequestHandler& handler)
         : _handler(handler) {}
+
+    /// The connection itself tells of its end, as a signal of a bus that there is not.
+    void listenForEndOf(QDBusConnection& bus) {
+        bus.connect(QString(),
+                    "/org/freedesktop/DBus/Local",
+                    "org.freedesktop.DBus.Local",
+                    "Disconnected",
+                    this,
+                    SLOT(busIsGone()));
+    }
 
     [[nodiscard]] QString introspect(const QString&) const override { return Introspection; }
 
@@ -60,6 +72,9 @@ public:
             connection.send(answer);
         return true;
     }
+
+private Q_SLOTS:
+    void busIsGone() { _handler.busIsGone(); }
 
 private:
     QDBusMessage answerTo(const QDBusMessage& message) {
@@ -159,6 +174,7 @@ ApplicationService::start(const std::string& applicationIdentifier,
                  fmt::format("{} runs already on this session bus.", applicationIdentifier));
         return nullptr;
     }
+    fields->object.listenForEndOf(bus);
     return std::unique_ptr<ApplicationService>(new ApplicationService(std::move(fields)));
 }
 
@@ -179,3 +195,5 @@ ApplicationService::~ApplicationService() {
 }
 
 } // namespace orvo
+
+#include "ApplicationService.moc"

@@ -96,7 +96,7 @@ class BusTest(ProgramTest):
             f'<limit name="service_start_timeout">{PATIENCE * 1000}</limit>'
             '<policy context="default"><allow send_destination="*" eavesdrop="true"/><allow eavesdrop="true"/>'
             '<allow own="*"/></policy></busconfig>').encode())
-        bus = subprocess.Popen(["dbus-daemon", f"--config-file={configuration}", "--nofork", "--print-address"],
+        self.bus = bus = subprocess.Popen(["dbus-daemon", f"--config-file={configuration}", "--nofork", "--print-address"],
                                env=self.environment, stdout=subprocess.PIPE, stderr=subprocess.DEVNULL)
         self.addCleanup(self.end, bus)
         self.environment["DBUS_SESSION_BUS_ADDRESS"] = bus.stdout.readline().decode().strip()

@@ -78,6 +78,11 @@ class OneInstance(BusTest):
         self.assertEqual(process.wait(PATIENCE), 0)
         self.assertFalse(self.is_running())
 
+    def test_it_ends_with_its_bus(self):
+        process = self.serve("--idle", "600")
+        self.end(self.bus)
+        self.assertEqual(process.wait(PATIENCE), 0)
+
     def test_idle_is_a_number(self):
         self.assertIn("--idle", self.refused(2, "service", "--idle", "soon").err)
 

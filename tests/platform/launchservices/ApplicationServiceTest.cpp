@@ -28,6 +28,8 @@ public:
                     request);
     }
 
+    void busIsGone() override { calls.emplace_back("the bus is gone"); }
+
     std::vector<std::string> calls;
     ApplicationRequest last;
     std::shared_ptr<NSError> answer;
@@ -163,6 +165,28 @@ TEST(ApplicationServiceDeathTest, WithoutABusThereIsNothingToServeOn) {
             const bool isNoBus =
                 error && error->code() == static_cast<std::int64_t>(LaunchServicesErrorCode::NoBus);
             std::_Exit(!serves && isNoBus ? 0 : 1);
+        },
+        ::testing::ExitedWithCode(0),
+        "");
+}
+
+TEST(ApplicationServiceDeathTest, TellsItsHandlerWhenTheBusIsGone) {
+    GTEST_FLAG_SET(death_test_style, "threadsafe"); // a process whose bus may go
+    EXPECT_EXIT(
+        {
+            auto bus = std::make_unique<testing::PrivateBus>();
+            constexpr int replace = 1;
+            setenv("DBUS_SESSION_BUS_ADDRESS", bus->address().c_str(), replace);
+            RecordingHandler handler;
+            const auto service = ApplicationService::start("org.example.Map", handler, nullptr);
+            bus.reset();
+            constexpr NSTimeInterval patience = 30;
+            const bool isTold =
+                RunLoop::main().runUntil([&] { return !handler.calls.empty(); }, patience);
+            std::_Exit(service && isTold &&
+                               handler.calls == std::vector<std::string>{"the bus is gone"}
+                           ? 0
+                           : 1);
         },
         ::testing::ExitedWithCode(0),
         "");
