@@ -60,8 +60,10 @@ public:
         const std::shared_ptr<OWTransitIncidentDataSource>& dataSource) override {
         calls.push_back("content " +
                         std::to_string(dataSource->tableView_numberOfRowsInSection(nullptr, 0)));
+        heights.push_back(dataSource->preferredContentSizeForExpanded_maxSize(false, {}).height);
     }
     std::vector<std::string> calls;
+    std::vector<double> heights; ///< that were preferred at each change of content
     std::shared_ptr<OWOpenable> selected;
 };
 
@@ -88,6 +90,18 @@ public:
                                               const std::string& identifier) override {
         calls.push_back("register " + identifier);
         UITableView::registerClass_forCellReuseIdentifier(std::move(cellClass), identifier);
+    }
+    void setTableFooterView(const std::shared_ptr<UIView>& view) override {
+        calls.emplace_back("footer");
+        UITableView::setTableFooterView(view);
+    }
+    void setDelegate(const std::shared_ptr<UITableViewDelegate>& delegate) override {
+        calls.emplace_back("delegate");
+        UITableView::setDelegate(delegate);
+    }
+    void setDataSource(const std::shared_ptr<UITableViewDataSource>& dataSource) override {
+        calls.emplace_back("data source");
+        UITableView::setDataSource(dataSource);
     }
     void deselectRowAtIndexPath_animated(const std::shared_ptr<NSIndexPath>& indexPath,
                                          bool animated) override {

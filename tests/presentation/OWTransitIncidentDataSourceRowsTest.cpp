@@ -22,12 +22,15 @@ TEST_F(DataSourceTest, AListThatHasNeverHadExpandedItemsHasNoExpandedRows) {
     EXPECT_EQ(rowsOf(*source), 0);
 }
 
-TEST_F(DataSourceTest, ConfiguresATableForBothCells) {
+TEST_F(DataSourceTest, ConfiguresATableForBothCellsThenServesIt) {
     const auto source = make(success(twoAdvisories()));
     const auto made = table(source);
-    EXPECT_THAT(
-        made->calls,
-        ElementsAre("register OWTransitItemFixedHeightCell", "register OWTransitSummaryCell"));
+    EXPECT_THAT(made->calls,
+                ElementsAre("register OWTransitItemFixedHeightCell",
+                            "register OWTransitSummaryCell",
+                            "footer",
+                            "delegate",
+                            "data source"));
     EXPECT_EQ(made->dataSource(), source);
     EXPECT_EQ(made->delegate(), source);
     ASSERT_TRUE(made->tableFooterView());

@@ -139,6 +139,14 @@ TEST_F(DataSourceTest, AnotherLimitIsToldOnlyWhereTheListChanges) {
     EXPECT_THAT(delegate->calls, ElementsAre("content 2"));
 }
 
+TEST_F(DataSourceTest, AHeightThatChangesWithTheLimitIsKeptWhenTheListIsTold) {
+    const auto source =
+        make(success(advisoriesWithShields({"a", "b", "c"})), {.expanded = true, .maxRows = 5});
+    source->setRowHeight_maxNumberOfRows(140, 2);
+    EXPECT_THAT(delegate->calls, ElementsAre("content 2"));
+    EXPECT_THAT(delegate->heights, ElementsAre(280));
+}
+
 TEST_F(DataSourceTest, AHeightThatChangesWithTheLimitIsNotToldWhereTheListIsEqual) {
     const auto source = make(success(twoAdvisories()), {.expanded = true, .maxRows = 5});
     source->setRowHeight_maxNumberOfRows(140, 4);

@@ -33,6 +33,29 @@ TEST_F(DataSourceTest, ATooWideShieldIsReplacedByASmallerOneAndTheRestOfTheRowIs
     EXPECT_EQ(after->artwork()->alpha(), before->artwork()->alpha());
 }
 
+TEST_F(DataSourceTest, ADimmedOrHiddenShieldStaysSoWhenItIsReplaced) {
+    cache->widths[{"wide", 7}] = 200;
+    cache->widths[{"wide", 6}] = 90;
+    const auto source = make(success(advisoriesWithShields({"wide", "b"})), {.expanded = true});
+    const auto shown = testing::rows(source->listItem())[0];
+    const auto dimmed =
+        OWTransitItem::initWithPrimaryText_secondaryText_artwork_artworkHidden_openable(
+            "dimmed",
+            std::nullopt,
+            OWConfiguredArtwork::initWithArtworkSource_alpha(shown->artwork()->artworkSource(),
+                                                             0.5),
+            true,
+            nullptr);
+    source->setListItem(OWTransitListItem::initWithSummaryItem_expandedItems(
+        dimmed, NSArray::arrayOf({dimmed, shown})));
+    const auto after = std::dynamic_pointer_cast<OWTransitItem>(source->shieldAjustedSummaryItem());
+    ASSERT_EQ(shieldSizeOf(after), 6);
+    EXPECT_EQ(after->artwork()->alpha(), 0.5);
+    EXPECT_TRUE(after->isArtworkHidden());
+    EXPECT_EQ(after->secondaryText(), std::nullopt);
+    EXPECT_EQ(after->openable(), nullptr);
+}
+
 TEST_F(DataSourceTest, WithACompactItemTheColumnIsTheCompactRows) {
     cache->widths[{"wide", 7}] = 120;
     Lines lines = advisoriesWithShields({"wide"});

@@ -3,6 +3,10 @@
 #include "platform/mapuikit/KitLabel.h"
 #include "platform/uikit/UIImage.h"
 #include "presentation/OWTransitItemFixedHeightCell.h"
+#include "presentation/VisualEffectWrappingView.h"
+
+#include <algorithm>
+#include <functional>
 
 namespace orvo {
 namespace {
@@ -35,6 +39,57 @@ std::shared_ptr<OWTransitItem> itemWithoutArtwork() {
     return OWTransitItem::initWithPrimaryText_secondaryText_artwork_artworkHidden_openable(
         "Line 1", "Delays", nullptr, false, nullptr);
 }
+
+/// Lets the test look around before its source changes.
+class WatchedArtworkView final : public ArtworkImageView {
+public:
+    static std::shared_ptr<WatchedArtworkView> make() {
+        auto view = std::make_shared<WatchedArtworkView>();
+        view->_initWithFrame({});
+        return view;
+    }
+    void setImageSource(std::shared_ptr<ArtworkImageSource> source) override {
+        if (beforeSource)
+            beforeSource();
+        ArtworkImageView::setImageSource(std::move(source));
+    }
+    std::function<void()> beforeSource;
+};
+
+/// Notes which of the two constraints at its texts' trailing edge hold, whenever that changes.
+class WatchedItemCell final : public Cell {
+public:
+    static std::shared_ptr<WatchedItemCell> make() {
+        auto cell = std::make_shared<WatchedItemCell>();
+        cell->_initWithStyle_reuseIdentifier(UITableViewCellStyle::Default, "id");
+        return cell;
+    }
+    std::vector<std::shared_ptr<NSLayoutConstraint>> _initialConstraints() override {
+        auto initial = Cell::_initialConstraints();
+        for (const auto& constraint : initial)
+            if (constraint->identifier() == "stackViewToTrailingGuide")
+                _toGutter = constraint;
+        return initial;
+    }
+    /// Asked for whenever a constraint in here comes or goes.
+    bool _isLayoutRoot() const override {
+        const std::string holding =
+            std::string(_toGutter && _toGutter->isActive() ? "gutter" : "") +
+            (holdsToTheEdge() ? "edge" : "");
+        if (steps.empty() || steps.back() != holding)
+            steps.push_back(holding);
+        return Cell::_isLayoutRoot();
+    }
+    mutable std::vector<std::string> steps;
+
+private:
+    [[nodiscard]] bool holdsToTheEdge() const {
+        return std::ranges::any_of(constraints(), [](const auto& constraint) {
+            return constraint->identifier() == "stackViewToContentGuideTrailing";
+        });
+    }
+    std::shared_ptr<NSLayoutConstraint> _toGutter;
+};
 
 class ItemCellContentTest : public testing::CellTest {
 protected:
@@ -141,6 +196,31 @@ TEST_F(ItemCellContentTest, TheOtherArtworkViewIsEmptiedWithEachItem) {
     EXPECT_FALSE(vibrant()->isHidden());
 }
 
+TEST_F(ItemCellContentTest, TheOtherArtworkViewIsEmptiedBeforeTheArtworkIsShown) {
+    const auto watched = WatchedArtworkView::make();
+    find<VisualEffectWrappingView>(cell, "vibrantImageView")->setWrappedView(watched);
+    const auto source = picture();
+    cell->setTransitItem(item({.source = source}));
+    int looks = 0;
+    watched->beforeSource = [&] {
+        ++looks;
+        expectUnused(plain());
+        EXPECT_EQ(cell->primaryLabel()->text(), "dimmed") << "the texts are there by then";
+        EXPECT_FALSE(cell->secondaryLabel()->isHidden()) << "and are hidden afterwards";
+    };
+    cell->setTransitItem(
+        item({.primary = "dimmed", .secondary = std::nullopt, .source = source, .alpha = 0.5}));
+    EXPECT_EQ(looks, 1);
+    EXPECT_TRUE(cell->secondaryLabel()->isHidden());
+    watched->beforeSource = [&] {
+        ++looks;
+        expectUnused(plain());
+    };
+    cell->setTransitItem(item({.source = source}));
+    EXPECT_EQ(looks, 2);
+    EXPECT_EQ(plain()->imageSource(), source);
+}
+
 TEST_F(ItemCellContentTest, AnItemWithoutArtworkShowsNothingInTheVibrantView) {
     cell->setTransitItem(item({.source = picture()}));
     cell->setTransitItem(itemWithoutArtwork());
@@ -187,6 +267,19 @@ TEST_F(ItemCellContentTest, TextsRunToTheEdgeWhileTheArtworkIsHidden) {
     check(false);
     cell->setTransitItem(item());
     check(true);
+}
+
+TEST_F(ItemCellContentTest, OfTheTwoTrailingConstraintsTheGuttersIsSwitchedFirst) {
+    const auto watched = WatchedItemCell::make();
+    const auto table = UIView::init();
+    table->addSubview(watched);
+    const auto steps = [&](bool hidden) {
+        watched->steps.clear();
+        watched->setTransitItem(item({.hidden = hidden}));
+        return watched->steps;
+    };
+    EXPECT_EQ(steps(true), (Names{"gutter", "", "edge"}));
+    EXPECT_EQ(steps(false), (Names{"edge", "gutteredge", "gutter"}));
 }
 
 } // namespace

@@ -114,6 +114,26 @@ TEST_F(SummaryCellLayoutTest, SizingLaysTheRowOutFirst) {
     EXPECT_LE(cell->systemLayoutSizeFittingSize(UILayoutFittingCompressedSize).width, 200);
 }
 
+TEST_F(SummaryCellLayoutTest, SizingSeesTheShieldsThatAreLeft) {
+    cell->setItem(summaryItem("2 advisories", artworks(9)));
+    cell->setFrame({{0, 0}, {200, RowHeight}});
+    EXPECT_LE(cell->systemLayoutSizeFittingSize(UILayoutFittingCompressedSize).width, 200);
+}
+
+TEST_F(SummaryCellLayoutTest, ShieldsAreCutOnceTheRowIsPlaced) {
+    bundle->whenAsked = [this] {
+        EXPECT_EQ(cell->contentView()->frame().size.width, cell->frame().size.width);
+        EXPECT_EQ(cell->primaryLabel()->frame().size.width, cell->frame().size.width);
+    };
+    cell->setItem(summaryItem("2 advisories", artworks(9)));
+    for (const CGFloat width : {300, 200}) {
+        layout(cell, width, RowHeight);
+        EXPECT_EQ(cell->artworksLabel()->maxWidth(), width);
+    }
+    EXPECT_FALSE(bundle->asked.empty());
+    bundle->whenAsked = nullptr;
+}
+
 TEST_F(SummaryCellLayoutTest, ShieldsStandBelowTheTitleInRowsOfAnyWidth) {
     EXPECT_EQ(layout(show("12 advisories", 9), 280, RowHeight), R"(
 cell 0 0 280 110

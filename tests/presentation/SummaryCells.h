@@ -5,6 +5,7 @@
 #include "platform/uikit/UIImage.h"
 #include "presentation/OWTransitSummaryCell.h"
 
+#include <functional>
 #include <optional>
 #include <string>
 #include <vector>
@@ -67,10 +68,13 @@ public:
                                       const std::optional<std::string>& value,
                                       const std::optional<std::string>& table) const override {
         asked.push_back(key + "|" + value.value_or("nil") + "|" + table.value_or("nil"));
+        if (whenAsked)
+            whenAsked();
         return text;
     }
     std::string text = "+%lu";
     mutable std::vector<std::string> asked;
+    std::function<void()> whenAsked;
 };
 
 inline std::shared_ptr<NSArray> artworks(int count) {
