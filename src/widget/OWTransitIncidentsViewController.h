@@ -64,7 +64,9 @@ public:
     [[nodiscard]] const std::shared_ptr<UITableView>& tableView() const noexcept {
         return _tableView;
     }
-    void setTableView(std::shared_ptr<UITableView> tableView) { _tableView = std::move(tableView); }
+    virtual void setTableView(std::shared_ptr<UITableView> tableView) {
+        _tableView = std::move(tableView);
+    }
     /// Nil until the view is loaded.
     [[nodiscard]] const std::shared_ptr<OWTransitIncidentDataSource>& dataSource() const noexcept {
         return _dataSource;

@@ -1,14 +1,22 @@
 #include "platform/foundation/Signpost.h"
+#include "platform/foundation/WorkerThreads.h"
 #include "support/GraphicalApplication.h"
 #include "widget/WidgetWorld.h"
 
 #include <gmock/gmock.h>
 
+#include <atomic>
+#include <thread>
+
 namespace orvo {
 namespace {
 
+using ::testing::AllOf;
 using testing::Calls;
+using ::testing::Each;
 using ::testing::ElementsAre;
+using ::testing::SizeIs;
+using ::testing::StrEq;
 
 class FakeSource final : public DispatchSource {
 public:
@@ -26,6 +34,23 @@ public:
 private:
     std::string _name;
     Calls& _calls;
+};
+
+/// Lets the test look around when its base class hears of something.
+class WatchedWidget final : public OWTransitIncidentsViewController {
+public:
+    static std::shared_ptr<WatchedWidget> make() {
+        auto widget = std::make_shared<WatchedWidget>();
+        EXPECT_TRUE(widget->_initWithNibName_bundle(std::nullopt, nullptr));
+        return widget;
+    }
+    std::function<void()> whenReached;
+
+private:
+    void _hasReachedBase(const char*) override {
+        if (whenReached)
+            whenReached();
+    }
 };
 
 /// Before the run loop makes an application object without a screen.
@@ -79,6 +104,23 @@ TEST_F(MemoryPressureOfTheWidget, IsListenedToByFourSourcesOfOneBitEachOnOneQueu
     EXPECT_THAT(calls, ElementsAre("2 off", "4 off", "16 off", "32 off"));
 }
 
+TEST_F(MemoryPressureOfTheWidget, ItsQueueIsSerialAndKeepsItsMisspeltName) {
+    controller = makeController();
+    (void)controller->view();
+    std::atomic<bool> isOver = false;
+    std::vector<std::string> names;
+    std::vector<std::thread::id> threads;
+    for (const auto& queue : queues)
+        queue->async([&] {
+            names.push_back(WorkerThreads::currentName());
+            threads.push_back(std::this_thread::get_id());
+        });
+    queues[0]->async([&] { isOver = true; });
+    ASSERT_TRUE(runUntil([&] { return isOver.load(); }));
+    EXPECT_THAT(names, AllOf(SizeIs(4), Each(StrEq("com.zentu.Orvo.TransitWidget.memoryPresure"))));
+    EXPECT_THAT(threads, Each(threads.at(0)));
+}
+
 TEST_F(MemoryPressureOfTheWidget, LeavesAMarkAndFreesNothing) {
     std::vector<SignpostEvent> events;
     const auto scope =
@@ -104,7 +146,8 @@ TEST_F(MemoryPressureOfTheWidget, LeavesAMarkAndFreesNothing) {
 TEST_F(MemoryPressureOfTheWidget, KeepsThePicturesWhichAWarningLetsGo) {
     if (!canDraw)
         GTEST_SKIP() << "another test of this process has made an application without a screen";
-    controller = makeController();
+    const auto widget = WatchedWidget::make();
+    controller = widget;
     (void)controller->view();
     const auto cache = controller->artworkCache();
     drawInto(*cache);
@@ -113,7 +156,12 @@ TEST_F(MemoryPressureOfTheWidget, KeepsThePicturesWhichAWarningLetsGo) {
     for (const auto& source : sources)
         source->handler();
     EXPECT_EQ(cache->bytes(), bytes);
+    std::vector<std::size_t> bytesWhenTheBaseHears;
+    widget->whenReached = [&] {
+        bytesWhenTheBaseHears.push_back(cache->bytes());
+    };
     controller->didReceiveMemoryWarning();
+    EXPECT_THAT(bytesWhenTheBaseHears, ElementsAre(bytes));
     EXPECT_EQ(cache->bytes(), 0U);
     EXPECT_EQ(controller->artworkCache(), cache);
 }

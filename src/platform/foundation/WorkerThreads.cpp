@@ -14,6 +14,7 @@ constexpr std::chrono::seconds PatienceAtEnd{1};
 constexpr std::size_t LongestThreadName = 15;
 
 thread_local const BlockList* currentList = nullptr;
+thread_local const std::string* nameOfThisThread = nullptr;
 
 } // namespace
 
@@ -32,7 +33,7 @@ void WorkerThreads::start(const std::shared_ptr<BlockList>& list, const std::str
     if (_ending)
         return;
     _lists.push_back(list);
-    std::thread thread([this, list] { work(list); });
+    std::thread thread([this, list, name] { work(list, name); });
     pthread_setname_np(thread.native_handle(), name.substr(0, LongestThreadName).c_str());
     thread.detach();
 }
@@ -41,8 +42,14 @@ bool WorkerThreads::runs(const BlockList& list) {
     return currentList == &list;
 }
 
-void WorkerThreads::work(const std::shared_ptr<BlockList>& list) {
+const std::string& WorkerThreads::currentName() {
+    static const std::string none;
+    return nameOfThisThread ? *nameOfThisThread : none;
+}
+
+void WorkerThreads::work(const std::shared_ptr<BlockList>& list, const std::string& name) {
     currentList = list.get();
+    nameOfThisThread = &name;
     while (auto block = list->take())
         block();
     const std::lock_guard lock(_mutex);

@@ -15,15 +15,18 @@ class WorkerThreads {
 public:
     [[nodiscard]] static WorkerThreads& shared();
 
-    /// Starts a thread that runs the blocks of `list` until the list is closed and empty.
+    /// Starts a thread that runs the blocks of `list` until the list is closed and empty. The
+    /// system's tools show the beginning of its name.
     void start(const std::shared_ptr<BlockList>& list, const std::string& name);
     /// Whether the caller is a worker of that list.
     [[nodiscard]] static bool runs(const BlockList& list);
+    /// The whole name that the caller's thread was started with; empty where it is no worker.
+    [[nodiscard]] static const std::string& currentName();
 
 private:
     WorkerThreads();
 
-    void work(const std::shared_ptr<BlockList>& list);
+    void work(const std::shared_ptr<BlockList>& list, const std::string& name);
     void endAll();
 
     std::mutex _mutex;

@@ -39,6 +39,7 @@ UIViewController::initWithNibName_bundle(const std::optional<std::string>& nibNa
 
 bool UIViewController::_initWithNibName_bundle(const std::optional<std::string>& /*nibName*/,
                                                const std::shared_ptr<NSObject>& /*bundle*/) {
+    _hasReachedBase("initWithNibName_bundle");
     return true;
 }
 

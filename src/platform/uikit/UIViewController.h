@@ -39,18 +39,20 @@ public:
     /// Sets the view; an empty one unless overridden.
     virtual void loadView();
     /// Once, after the view has been made. An override of this or any of the next calls its base.
-    virtual void viewDidLoad() {}
+    virtual void viewDidLoad() { _hasReachedBase("viewDidLoad"); }
     /// Before the view lays out its subviews.
-    virtual void viewWillLayoutSubviews() {}
-    virtual void viewWillAppear(bool /*animated*/) {}
-    virtual void viewDidAppear(bool /*animated*/) {}
-    virtual void viewWillDisappear(bool /*animated*/) {}
-    virtual void viewDidDisappear(bool /*animated*/) {}
+    virtual void viewWillLayoutSubviews() { _hasReachedBase("viewWillLayoutSubviews"); }
+    virtual void viewWillAppear(bool /*animated*/) { _hasReachedBase("viewWillAppear"); }
+    virtual void viewDidAppear(bool /*animated*/) { _hasReachedBase("viewDidAppear"); }
+    virtual void viewWillDisappear(bool /*animated*/) { _hasReachedBase("viewWillDisappear"); }
+    virtual void viewDidDisappear(bool /*animated*/) { _hasReachedBase("viewDidDisappear"); }
     /// The view is about to become as large as `size`.
     virtual void viewWillTransitionToSize_withTransitionCoordinator(
         CGSize /*size*/,
-        const std::shared_ptr<UIViewControllerTransitionCoordinator>& /*coordinator*/) {}
-    virtual void didReceiveMemoryWarning() {}
+        const std::shared_ptr<UIViewControllerTransitionCoordinator>& /*coordinator*/) {
+        _hasReachedBase("viewWillTransitionToSize_withTransitionCoordinator");
+    }
+    virtual void didReceiveMemoryWarning() { _hasReachedBase("didReceiveMemoryWarning"); }
 
     /// How large the content would like to be, in points.
     [[nodiscard]] CGSize preferredContentSize() const noexcept { return _preferredContentSize; }
@@ -64,6 +66,9 @@ public:
 protected:
     bool _initWithNibName_bundle(const std::optional<std::string>& nibName,
                                  const std::shared_ptr<NSObject>& bundle);
+    /// One of the calls above, by its name, has come as far as this class: whether an override lets
+    /// it, and when, is seen here. Does nothing.
+    virtual void _hasReachedBase(const char* /*call*/) {}
 
 private:
     std::shared_ptr<NSExtensionContext> _extensionContext;
