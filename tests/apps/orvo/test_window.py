@@ -1,42 +1,28 @@
 """The windows of the application, on a display that nobody looks at."""
 
 import os
-import shutil
 import signal
 import subprocess
-import time
 import unittest
 
 from assistive import AssistiveTools
+from display import Display
 from handing import INTERFACE, NAME, PATH, PATIENCE, BusTest, incident, line, tap_on_incidents, tap_on_line
 from support import feed
 
 WIDGET = os.environ["ORVO_WIDGET"]
 
 
-class WindowTest(BusTest):
+class WindowTest(Display, BusTest):
     """With a display, which what the bus starts has too."""
 
     @classmethod
     def setUpClass(cls):
-        for program in ("Xvfb", "xdotool"):
-            if not shutil.which(program):
-                raise unittest.SkipTest(f"there is no {program}")
-        told, tells = os.pipe()
-        display = subprocess.Popen(["Xvfb", "-displayfd", str(tells), "-screen", "0", "1280x1024x24", "-nolisten", "tcp",
-                                    "-noreset"], pass_fds=[tells], stdout=subprocess.DEVNULL, stderr=subprocess.DEVNULL)
-        cls.addClassCleanup(display.wait)
-        cls.addClassCleanup(display.terminate)
-        os.close(tells)
-        with os.fdopen(told) as answer:
-            cls.display = ":" + answer.readline().strip()
+        cls.start_display()
 
     def start_bus(self):
-        for name in ("QT_QPA_PLATFORM", "WAYLAND_DISPLAY"):
-            self.environment.pop(name, None)
-        runtime = self.home / "runtime"
-        runtime.mkdir(mode=0o700)
-        self.environment.update(DISPLAY=self.display, XDG_RUNTIME_DIR=str(runtime))
+        self.forget_displays()
+        self.environment["DISPLAY"] = self.display
         super().start_bus()
         if self.activates:
             self.addCleanup(self.end_service)
@@ -58,14 +44,10 @@ class WindowTest(BusTest):
                                   timeout=PATIENCE)
         self.assertEqual((finished.returncode, finished.stderr), (0, b""))
 
-    def xdotool(self, *words):
-        return subprocess.run(["xdotool", *map(str, words)], env=self.environment, capture_output=True, timeout=PATIENCE,
-                              text=True).stdout
-
     def windows(self):
         """Those that are seen, by their titles."""
-        found = self.xdotool("search", "--onlyvisible", "--class", "^orvo$").split()
-        return {self.xdotool("getwindowname", window).strip(): window for window in found}
+        found = self.xdotool("search", "--onlyvisible", "--class", "^orvo$", check=False).split()
+        return {self.xdotool("getwindowname", window, check=False).strip(): window for window in found}
 
     def window(self, title):
         """The window of that title, as soon as it is seen."""
@@ -76,15 +58,6 @@ class WindowTest(BusTest):
 
     def write_text(self, window, text):
         self.xdotool("windowfocus", "--sync", window, "type", "--delay", "30", text)
-
-    def eventually(self, look, what):
-        """Until it holds; answers what was seen."""
-        deadline = time.monotonic() + PATIENCE
-        while not (seen := look()):
-            if time.monotonic() > deadline:
-                self.fail(f"not so: {what}")
-            time.sleep(0.02)
-        return seen
 
 
 class Taps(WindowTest):

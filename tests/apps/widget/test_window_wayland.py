@@ -4,10 +4,10 @@ import glob
 import pathlib
 import shutil
 import subprocess
-import time
 import unittest
 
-from window_support import PATIENCE, WindowTest, works
+from display import Display
+from window_support import WindowTest, works
 
 SOCKET = "orvo-test"
 
@@ -29,11 +29,11 @@ class Wayland(WindowTest):
         self.addCleanup(compositor.wait)
         self.addCleanup(compositor.terminate)
         socket = pathlib.Path(self.environment["XDG_RUNTIME_DIR"], SOCKET)
-        deadline = time.monotonic() + PATIENCE
-        while not socket.exists():
+
+        def is_there():
             self.assertIsNone(compositor.poll(), "weston has ended")
-            self.assertLess(time.monotonic(), deadline, "weston makes no display")
-            time.sleep(0.02)
+            return socket.exists()
+        Display.eventually(self, is_there, "weston makes a display")
 
     def on_display(self):
         return {"WAYLAND_DISPLAY": SOCKET}

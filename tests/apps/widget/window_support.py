@@ -3,17 +3,15 @@
 import http.server
 import os
 import pathlib
-import shutil
 import signal
 import struct
 import subprocess
 import sys
-import tempfile
 import threading
 import time
-import unittest
 
 from assistive import PROPERTIES, SERVICE, AssistiveTools
+from display import Display
 from handing import NAME, BusTest
 from support import feed
 from widget_support import NOW, WIDGET, WidgetTest, alert, period, selector, text
@@ -66,43 +64,19 @@ class AlertHandler(http.server.BaseHTTPRequestHandler):
         pass
 
 
-class WindowTest(AssistiveTools, BusTest, WidgetTest):
+class WindowTest(Display, AssistiveTools, BusTest, WidgetTest):
     """The widget in a window of a display that nobody looks at, beside a session bus with assistive tools."""
+
+    patience = PATIENCE
 
     @classmethod
     def setUpClass(cls):
-        for program in ("Xvfb", "xdotool", "dbus-daemon"):
-            if not shutil.which(program):
-                raise unittest.SkipTest(f"there is no {program}")
         cls.find_tools()
         cls.start_display()
 
-    @classmethod
-    def start_display(cls):
-        told, tells = os.pipe()
-        folder = tempfile.TemporaryDirectory(prefix="orvo-display-")
-        cls.addClassCleanup(folder.cleanup)
-        cls.pixels = pathlib.Path(folder.name) / "Xvfb_screen0"
-        display = subprocess.Popen(["Xvfb", "-displayfd", str(tells), "-screen", "0", "1280x1024x24", "-nolisten", "tcp",
-                                    "-noreset", "-fbdir", folder.name],
-                                   pass_fds=[tells], stdout=subprocess.DEVNULL, stderr=subprocess.DEVNULL)
-        cls.addClassCleanup(display.wait)
-        cls.addClassCleanup(display.terminate)
-        os.close(tells)
-        with os.fdopen(told) as answer:
-            cls.display = ":" + answer.readline().strip()
-
     def start_bus(self):
-        runtime = self.home / "runtime"
-        runtime.mkdir(mode=0o700)
-        self.environment["XDG_RUNTIME_DIR"] = str(runtime)
-        # The bus starts services without a display: none of them shows anything here.
-        for name in ("QT_QPA_PLATFORM", "DISPLAY", "WAYLAND_DISPLAY"):
-            self.environment.pop(name, None)
-        services = self.home / "services"
-        services.mkdir()
-        self.write_service(services, f'"{os.environ["ORVO_PROGRAM"]}" service --idle 600')
-        self.bus_with(f"<servicedir>{services}</servicedir>")
+        self.forget_displays()  # what the bus starts shows nothing here
+        super().start_bus()
         self.environment["DBUS_SYSTEM_BUS_ADDRESS"] = "disabled:"
 
     def system_bus(self):
@@ -141,7 +115,7 @@ class WindowTest(AssistiveTools, BusTest, WidgetTest):
 
     def find_window(self, process):
         """And types into it from now on."""
-        self.window = self.xdotool("search", "--all", "--onlyvisible", "--pid", str(process.pid), "--name", ".").split()[0]
+        self.window = self.xdotool("search", "--all", "--onlyvisible", "--pid", process.pid, "--name", ".").split()[0]
         self.xdotool("windowfocus", "--sync", self.window)
 
     def close_widget(self, how=signal.SIGTERM):
@@ -158,20 +132,16 @@ class WindowTest(AssistiveTools, BusTest, WidgetTest):
         self.process.wait(PATIENCE)
 
     def eventually(self, look, what):
-        """Until it holds; answers what was seen."""
-        deadline = time.monotonic() + PATIENCE
-        while True:
+        """Until it holds, while the widget lives; answers what was seen."""
+        def look_at_widget():
             try:
                 seen = look()
             except (self.dbus.DBusException, FileNotFoundError):
                 seen = None  # it went while it was asked
-            if seen:
-                return seen
-            if self.process.poll() is not None:
+            if not seen and self.process.poll() is not None:
                 self.fail(f"{what}: the widget has ended: {self.process.stderr.read().decode()}")
-            if time.monotonic() > deadline:
-                self.fail(f"not so: {what}")
-            time.sleep(0.02)
+            return seen
+        return super().eventually(look_at_widget, what)
 
     # What it shows
 
@@ -225,13 +195,9 @@ class WindowTest(AssistiveTools, BusTest, WidgetTest):
 
     # What a person does
 
-    def xdotool(self, *words):
-        return subprocess.run(["xdotool", *words], env={**self.environment, "DISPLAY": self.display}, check=True,
-                              capture_output=True, text=True, timeout=PATIENCE).stdout
-
     def click(self, part):
         x, y = part.middle
-        self.xdotool("mousemove", "--sync", str(x), str(y), "click", "1")
+        self.xdotool("mousemove", "--sync", x, y, "click", 1)
 
     def keys(self, *names):
         self.xdotool("key", "--delay", "30", *names)
