@@ -16,6 +16,7 @@ set(MODULE_MAP
   "platform/feeds/schedule: platform/foundation platform/sqlite platform/geoservices"
   "platform/feeds/alerts: platform/foundation platform/geoservices platform/feeds/schedule"
   "platform/feeds/http: platform/foundation"
+  "platform/feeds/http/sockets: platform/feeds/http"
   "platform/feeds: platform/foundation platform/geoservices platform/feeds/schedule platform/feeds/alerts platform/feeds/http"
   "platform/mapuikit: platform/foundation platform/uikit platform/uikit/drawing platform/uikit/text platform/uikit/table platform/geoservices platform/favorites platform/feeds platform/launchservices"
   "platform/extension: platform/foundation platform/uikit platform/uikit/drawing platform/uikit/text platform/uikit/table platform/launchservices"
@@ -35,10 +36,11 @@ set(MODULE_MAP
   "print: orvo/console platform/foundation platform/uikit platform/uikit/drawing platform/uikit/text platform/uikit/table platform/extension platform/launchservices platform/geoservices platform/favorites platform/feeds platform/mapuikit platform/demo shared widget/result fetching handoff analytics viewmodel presentation widget"
   "orvo: orvo/console orvo/window platform/foundation platform/protobuf platform/uikit platform/launchservices platform/geoservices platform/favorites platform/feeds platform/feeds/schedule platform/feeds/alerts platform/feeds/http platform/mapuikit platform/demo shared widget/result fetching handoff"
 )
-# platform/lockbox is a loadable library of its own, made without add_module; no other row may name it.
+# platform/lockbox and platform/feeds/http/sockets are loadable libraries of their own, made without add_module; no other row may
+# name them.
 # Third-party headers, and the only modules whose .cpp files may name them.
 set(THIRD_PARTY_MAP
-  "qt: platform/foundation platform/uikit/text platform/uikit/drawing platform/uikit platform/extension platform/feeds/http platform/mapuikit platform/launchservices platform/demo platform/settings platform/extension/window orvo/window orvo"
+  "qt: platform/foundation platform/uikit/text platform/uikit/drawing platform/uikit platform/extension platform/feeds/http platform/feeds/http/sockets platform/mapuikit platform/launchservices platform/demo platform/settings platform/extension/window orvo/window orvo"
   "unicode/: platform/foundation platform/uikit/text platform/feeds/schedule platform/feeds/alerts orvo/console"
   "fontconfig/: platform/uikit/text"
   "sqlite3: platform/sqlite"

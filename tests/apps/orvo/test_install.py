@@ -30,6 +30,7 @@ EXPECTED = (
     "share/orvo-transit-widget/en.lproj/Windows.strings",
     "share/orvo-transit-widget/ar.lproj/Windows.strings",
     "lib/orvo-transit-widget/System/Library/PrivateFrameworks/Lockbox.framework/Lockbox",
+    "lib/orvo-transit-widget/OrvoSockets.so",
 )
 
 
@@ -110,6 +111,19 @@ class Staged(InstallTest):
         finished = subprocess.run([self.prefix / "bin/orvo-transit-widget", "--demo", "--print", "text"],
                                   env=self.environment, capture_output=True, text=True, timeout=120)
         self.assertIn("Splendid service", finished.stdout, finished.stderr)
+
+    def test_servers_are_asked_by_the_library_beside_them(self):
+        def reason():
+            finished = subprocess.run([self.prefix / "bin/orvo", "feeds", "add", "city", "--static", "http://127.0.0.1:9/city.zip",
+                                       "--alerts", "http://127.0.0.1:9/alerts.pb"],
+                                      env=self.environment, capture_output=True, text=True, timeout=120)
+            self.assertEqual(finished.returncode, 1, finished.stdout)
+            return finished.stderr
+
+        self.assertIn("refused", reason())
+        library = self.prefix / "lib/orvo-transit-widget/OrvoSockets.so"
+        library.unlink()
+        self.assertIn(str(library.resolve()), reason())
 
     def test_nothing_is_left_of_it(self):
         self.uninstall()

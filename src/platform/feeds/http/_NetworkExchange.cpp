@@ -1,12 +1,9 @@
 #include "platform/feeds/http/_NetworkExchange.h"
 
 #include "platform/feeds/http/HttpURL.h"
+#include "platform/feeds/http/_NetworkLibrary.h"
 #include "platform/foundation/Environment.h"
 
-#include <QNetworkProxyFactory>
-#include <QSslError>
-#include <QSslSocket>
-#include <QTcpSocket>
 #include <QTimer>
 #include <QUrl>
 
@@ -17,64 +14,26 @@ namespace orvo {
 
 namespace {
 
-constexpr quint16 HttpPort = 80;
-constexpr quint16 HttpsPort = 443;
-
 double monotonicNow() {
     return Environment::monotonicClock().get()->seconds();
 }
 
-QUrl parsed(const HttpExchange& exchange) {
-    return QUrl::fromEncoded(QByteArray::fromStdString(exchange.url));
-}
-
-bool isSecure(const QUrl& url) {
-    return url.scheme() == QLatin1String("https");
-}
-
-std::unique_ptr<QTcpSocket> socketFor(const QUrl& url) {
-    // TLS costs a library, which is loaded where it is needed.
-    if (isSecure(url))
-        return std::make_unique<QSslSocket>();
-    return std::make_unique<QTcpSocket>();
-}
-
-quint16 portOf(const QUrl& url) {
-    return static_cast<quint16>(url.port(isSecure(url) ? HttpsPort : HttpPort));
-}
-
-/// The one that the person's settings name for the URL; this machine itself is asked directly.
-QNetworkProxy proxyFor(const QUrl& url) {
-    const auto host = url.host();
-    if (host == QLatin1String("localhost") || host == QLatin1String("127.0.0.1") ||
-        host == QLatin1String("::1"))
-        return QNetworkProxy::NoProxy;
-    const auto proxies = QNetworkProxyFactory::systemProxyForQuery(QNetworkProxyQuery(url));
-    return proxies.isEmpty() ? QNetworkProxy::NoProxy : proxies.first();
-}
-
-/// Whether the proxy is asked by HTTP itself, with the whole URL in place of the target.
-bool isAskedForURLs(const QNetworkProxy& proxy, const QUrl& url) {
-    return !isSecure(url) && (proxy.type() == QNetworkProxy::HttpProxy ||
-                              proxy.type() == QNetworkProxy::HttpCachingProxy);
-}
-
-std::string requestHead(const HttpExchange& exchange, const QUrl& url, const QNetworkProxy& proxy) {
-    const bool asksProxy = isAskedForURLs(proxy, url);
+std::string requestHead(const HttpExchange& exchange,
+                        const std::optional<NetworkConnection::URLProxy>& proxy) {
+    const auto url = QUrl::fromEncoded(QByteArray::fromStdString(exchange.url));
     auto hidden = QUrl::RemoveUserInfo | QUrl::RemoveFragment;
-    if (!asksProxy)
+    if (!proxy)
         hidden |= QUrl::RemoveScheme | QUrl::RemoveAuthority;
     auto target = url.toEncoded(hidden).toStdString();
-    if (url.path().isEmpty() && !asksProxy)
+    if (url.path().isEmpty() && !proxy)
         target.insert(0, "/");
     auto head =
         fmt::format("GET {} HTTP/1.1\r\nHost: {}\r\nConnection: close\r\nAccept-Encoding: gzip\r\n",
                     target,
                     url.authority(QUrl::RemoveUserInfo | QUrl::FullyEncoded).toStdString());
-    if (asksProxy && !proxy.user().isEmpty())
-        head += fmt::format(
-            "Proxy-Authorization: Basic {}\r\n",
-            HttpURL::base64((proxy.user() + QLatin1Char(':') + proxy.password()).toStdString()));
+    if (proxy && !proxy->user.empty())
+        head += fmt::format("Proxy-Authorization: Basic {}\r\n",
+                            HttpURL::base64(proxy->user + ':' + proxy->password));
     for (const auto& [name, value] : exchange.headers)
         head += fmt::format("{}: {}\r\n", name, value);
     return head + "\r\n";
@@ -87,94 +46,72 @@ _NetworkExchange::_NetworkExchange(HttpExchange exchange, Ended ended)
     , _ended(std::move(ended))
     , _parser(_exchange.maximumBytes)
     , _lastByteAt(monotonicNow())
-    , _socket(socketFor(parsed(_exchange))) {
-    watch();
-    // Later, for a socket may fail inside the call.
-    QTimer::singleShot(0, _socket.get(), [this] { connect(parsed(_exchange)); });
+    , _life(std::make_shared<bool>(true)) {
+    // Later, for a connection may fail inside the call.
+    QTimer::singleShot(0, [this, life = std::weak_ptr(_life)] {
+        if (!life.expired())
+            open();
+    });
 }
 
-_NetworkExchange::~_NetworkExchange() {
-    // It may be the caller: not deleted before it has returned.
-    auto* socket = _socket.release();
-    socket->disconnect();
-    socket->abort();
-    socket->deleteLater();
+_NetworkExchange::~_NetworkExchange() = default;
+
+NetworkConnection::Handlers _NetworkExchange::handlers() {
+    return {.opened = [this] { sendRequest(); },
+            .bytesCame = [this] { bytesCame(); },
+            .ended =
+                [this](NetworkConnection::End way, const std::string& reason) {
+                    connectionEnded(way, reason);
+                }};
 }
 
-void _NetworkExchange::watch() {
-    auto* socket = _socket.get();
-    QObject::connect(socket, &QTcpSocket::readyRead, socket, [this] { bytesCame(); });
-    QObject::connect(socket, &QTcpSocket::disconnected, socket, [this] { connectionEnded(); });
-    QObject::connect(socket, &QTcpSocket::errorOccurred, socket, [this] { connectionFailed(); });
-    if (auto* secure = qobject_cast<QSslSocket*>(socket))
-        watch(*secure);
+void _NetworkExchange::open() {
+    std::string reason;
+    _connection = _NetworkLibrary::connectionTo(_exchange.url, handlers(), reason);
+    if (_connection)
+        _connection->open();
     else
-        QObject::connect(socket, &QTcpSocket::connected, socket, [this] { sendRequest(); });
-}
-
-void _NetworkExchange::watch(QSslSocket& socket) {
-    QObject::connect(&socket, &QSslSocket::encrypted, &socket, [this] { sendRequest(); });
-    QObject::connect(
-        &socket, &QSslSocket::sslErrors, &socket, [this](const QList<QSslError>& errors) {
-            if (_tlsReason.empty() && !errors.isEmpty())
-                _tlsReason = errors.first().errorString().toStdString();
-        });
-}
-
-void _NetworkExchange::connect(const QUrl& url) {
-    const auto proxy = proxyFor(url);
-    _requestHead = requestHead(_exchange, url, proxy);
-    if (isAskedForURLs(proxy, url)) {
-        _socket->setProxy(QNetworkProxy::NoProxy);
-        _socket->connectToHost(proxy.hostName(), proxy.port());
-        return;
-    }
-    _socket->setProxy(proxy);
-    if (auto* secure = qobject_cast<QSslSocket*>(_socket.get()))
-        secure->connectToHostEncrypted(url.host(), portOf(url));
-    else
-        _socket->connectToHost(url.host(), portOf(url));
+        fail(HttpAnswer::Failure::Unreachable, std::move(reason));
 }
 
 void _NetworkExchange::sendRequest() {
     _lastByteAt = monotonicNow();
-    _socket->write(_requestHead.data(), static_cast<qint64>(_requestHead.size()));
+    _connection->write(requestHead(_exchange, _connection->urlProxy()));
 }
 
-void _NetworkExchange::bytesCame() {
+void _NetworkExchange::read() {
     _lastByteAt = monotonicNow();
     std::array<char, 64 * 1024> part; // NOLINT(cppcoreguidelines-pro-type-member-init): read into
     while (!_parser.isComplete()) {
-        const auto count = _socket->read(part.data(), part.size());
-        if (count <= 0)
+        const auto count = _connection->read(part);
+        if (count == 0)
             break;
-        _parser.feed(
-            {reinterpret_cast<const std::uint8_t*>(part.data()), static_cast<std::size_t>(count)});
+        _parser.feed({reinterpret_cast<const std::uint8_t*>(part.data()), count});
     }
     if (_exchange.progress && _parser.bodyLength() > 0)
         _exchange.progress(_parser.bodyLength(), _parser.announcedLength());
+}
+
+void _NetworkExchange::bytesCame() {
+    read();
     if (_parser.isComplete())
         end(_parser.takeAnswer());
 }
 
-void _NetworkExchange::connectionEnded() {
-    bytesCame();
-    if (!_ended)
+void _NetworkExchange::connectionEnded(NetworkConnection::End way, const std::string& reason) {
+    switch (way) {
+    case NetworkConnection::End::Untrusted:
+        fail(HttpAnswer::Failure::Untrusted, "the server cannot be trusted: " + reason);
         return;
-    _parser.endOfConnection();
-    end(_parser.takeAnswer());
-}
-
-void _NetworkExchange::connectionFailed() {
-    const auto error = _socket->error();
-    if (error == QAbstractSocket::RemoteHostClosedError)
-        connectionEnded();
-    else if (error == QAbstractSocket::SslHandshakeFailedError)
-        fail(HttpAnswer::Failure::Untrusted,
-             "the server cannot be trusted: " +
-                 (_tlsReason.empty() ? _socket->errorString().toStdString() : _tlsReason));
-    else
-        fail(HttpAnswer::Failure::Unreachable, _socket->errorString().toStdString());
+    case NetworkConnection::End::Failed:
+        fail(HttpAnswer::Failure::Unreachable, reason);
+        return;
+    case NetworkConnection::End::Closed:
+        read();
+        if (!_parser.isComplete())
+            _parser.endOfConnection();
+        end(_parser.takeAnswer());
+    }
 }
 
 void _NetworkExchange::checkTime(double now) {

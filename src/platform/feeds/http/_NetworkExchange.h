@@ -2,14 +2,10 @@
 
 #include "platform/feeds/http/HttpResponseParser.h"
 #include "platform/feeds/http/HttpTransport.h"
+#include "platform/feeds/http/NetworkConnection.h"
 
 #include <memory>
 #include <string>
-
-class QNetworkProxy;
-class QSslSocket;
-class QTcpSocket;
-class QUrl;
 
 namespace orvo {
 
@@ -30,13 +26,12 @@ public:
     void checkTime(double now);
 
 private:
-    void watch();
-    void watch(QSslSocket& socket);
-    void connect(const QUrl& url);
+    [[nodiscard]] NetworkConnection::Handlers handlers();
+    void open();
     void sendRequest();
+    void read();
     void bytesCame();
-    void connectionEnded();
-    void connectionFailed();
+    void connectionEnded(NetworkConnection::End way, const std::string& reason);
     void fail(HttpAnswer::Failure failure, std::string reason);
     void end(HttpAnswer answer);
 
@@ -44,9 +39,8 @@ private:
     Ended _ended;
     HttpResponseParser _parser;
     double _lastByteAt;
-    std::string _requestHead;
-    std::string _tlsReason;              // of the first thing wrong with the certificate
-    std::unique_ptr<QTcpSocket> _socket; // with TLS where the URL asks for it
+    std::unique_ptr<NetworkConnection> _connection; // nil where none can be made
+    std::shared_ptr<const bool> _life;              // ends with the exchange
 };
 
 } // namespace orvo

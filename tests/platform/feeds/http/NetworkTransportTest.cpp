@@ -10,6 +10,7 @@
 #include <gtest/gtest.h>
 
 #include <algorithm>
+#include <cstdlib>
 #include <fstream>
 #include <future>
 #include <latch>
@@ -85,6 +86,21 @@ TEST_F(NetworkTransportTest, AsksWithGetForTheWholeTarget) {
     EXPECT_EQ(asked.headers.at("authorization"), "Basic bWU6aGlkZGVu");
     EXPECT_EQ(asked.headers.at("accept-encoding"), "gzip");
     EXPECT_FALSE(asked.headers.contains("cookie"));
+}
+
+TEST_F(NetworkTransportTest, AProxyOfThePersonsIsAskedForTheWholeURL) {
+    serve(httpReply(200, {}, "body"));
+    auto proxy = server->url();
+    proxy.insert(std::string_view("http://").size(), "me:hidden@");
+    setenv("http_proxy", proxy.c_str(), 1);
+    request = requestFor("http://city.example/alerts.pb?agency=1");
+    const auto body = load(*loader, request);
+    unsetenv("http_proxy");
+    EXPECT_EQ(textOf(body), "body");
+    const auto asked = server->requests().front();
+    EXPECT_EQ(asked.target, "http://city.example/alerts.pb?agency=1");
+    EXPECT_EQ(asked.headers.at("host"), "city.example");
+    EXPECT_EQ(asked.headers.at("proxy-authorization"), "Basic bWU6aGlkZGVu");
 }
 
 TEST_F(NetworkTransportTest, CookiesAreNotKept) {
