@@ -85,7 +85,7 @@ TEST_F(IncidentsCommandTest, WhatIsUnknownIsToldWithTheReasonAndTheCure) {
     answered({"favorites", "add", "city:M1", "gone:M1", "gone:T4"});
     const std::string told =
         "orvo: warning: the status of gone:M1, gone:T4 is unknown: The service alerts could not be "
-        "read. /nowhere.pb: there is no such file\n"
+        "read: /nowhere.pb: there is no such file\n"
         "See what its sources say with: orvo feeds check gone\n";
     EXPECT_EQ(run({"incidents"}).error, told);
     EXPECT_EQ(run({"incidents", "--json"}).error, told);

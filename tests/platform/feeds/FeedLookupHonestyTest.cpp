@@ -294,7 +294,7 @@ TEST_F(FeedLookupDamage, ALineThatCannotBeReadIsUnknownAndSaysWhy) {
     const auto answer = lookUp({city("2"), coast("A")});
     EXPECT_THAT(statuses(answer), ElementsAre("unknown", "clear"));
     const auto why = incidents(answer.items[0]).front()->fullDescription().value_or("");
-    EXPECT_THAT(why, HasSubstr("The schedule could not be read."));
+    EXPECT_THAT(why, HasSubstr("The schedule could not be read: "));
     EXPECT_THAT(why, HasSubstr(ScheduleStore::defaultPath().string()));
 }
 
@@ -303,7 +303,7 @@ TEST_F(FeedLookupDamage, LinesOfAScheduleThatCannotBeReadAreUnknownAndTheOthersK
     EXPECT_THAT(statuses(answer), ElementsAre("unknown", "clear", "unknown"));
     EXPECT_EQ(answer.items[0]->name(), "Line 1");
     EXPECT_THAT(incidents(answer.items[2]).front()->fullDescription().value_or(""),
-                HasSubstr("The schedule could not be read."));
+                HasSubstr("The schedule could not be read: "));
     EXPECT_THAT(asked, ElementsAre("coast/alerts"));
 }
 

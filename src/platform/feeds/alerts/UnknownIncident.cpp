@@ -20,16 +20,26 @@ std::uint64_t muidOf(const UnknownLine& line) {
     return std::max<std::uint64_t>(stableHash(content), 1);
 }
 
+/// A sentence with its cause, which may be no sentence, behind a colon.
+std::string because(std::string sentence, const std::string& cause) {
+    if (cause.empty())
+        return sentence;
+    if (sentence.ends_with('.'))
+        sentence.pop_back();
+    return sentence + ": " + cause;
+}
+
 std::string reasonInWords(const UnknownStatus& status, const IncidentWords& words) {
     switch (status.reason) {
     case UnknownStatus::Reason::SourceFailed:
-        return words.sourceFailed();
+        return because(words.sourceFailed(), status.cause);
     case UnknownStatus::Reason::SelectorLost:
-        return words.selectorLost();
+        return status.cause.empty() ? words.selectorLost()
+                                    : words.selectorLost() + "\n\n" + status.cause;
     case UnknownStatus::Reason::LineDeparted:
         return words.lineDeparted();
     case UnknownStatus::Reason::ScheduleUnread:
-        return words.scheduleUnread();
+        return because(words.scheduleUnread(), status.cause);
     case UnknownStatus::Reason::NothingToAsk:
         return words.nothingToAsk();
     }
@@ -52,8 +62,6 @@ std::shared_ptr<FeedTransitIncident> makeUnknownIncident(const UnknownLine& line
     fields.title = words.statusUnknown();
     fields.summary = words.lastKnown(line.systemName, age);
     fields.fullDescription = *fields.summary + "\n\n" + reasonInWords(status, words);
-    if (!status.cause.empty())
-        *fields.fullDescription += "\n\n" + status.cause;
     fields.messageForRoutePlanning = fields.title;
     fields.messageForRouteStepping = fields.title;
     fields.messageForNonRoutable = fields.title;

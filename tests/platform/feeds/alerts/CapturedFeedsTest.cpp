@@ -1,4 +1,6 @@
+#include "AlertMaker.h"
 #include "CapturedFeed.h"
+#include "platform/feeds/alerts/AlertReader.h"
 #include "platform/geoservices/TransitIncidentAffectedEntity.h"
 
 #include <gtest/gtest.h>
@@ -74,6 +76,17 @@ std::string dump(const LineIncidents& line) {
     return text;
 }
 
+/// The captured message as it would be if each of its alerts named the route besides.
+std::string alsoNaming(const char* routeId, const std::string& bytes, std::uint64_t timestamp) {
+    const auto data = NSData::dataWithString(bytes);
+    const auto message = AlertReader::read(data->bytes(), nullptr);
+    Wire wire;
+    wire.bytes(1, header(timestamp));
+    for (const std::string_view entity : message.value().entities)
+        wire.bytes(2, Wire().raw(entity).bytes(5, Wire().bytes(5, route(routeId))));
+    return wire.str();
+}
+
 class CapturedFeeds : public ::testing::Test {
 protected:
     void SetUp() override {
@@ -145,6 +158,58 @@ TEST_F(CapturedFeeds, DetroitsStationsCloseOneAfterTheOther) {
         shown(feed.answer("alerts-20231009.pb", 1696714317 + 86400), "22210"),
         (std::vector<Shown>{
             {"Michigan station closed for construction", 1696824001, 1697126399, true, false}}));
+}
+
+TEST_F(CapturedFeeds, TheBelgianRailwaysTellEachIncidentOnceInEachLanguageAndOfNoLine) {
+    const auto folder = capturedFeeds() / "irail-nmbs-2015";
+    for (const auto& [file, now] : std::map<const char*, double>{{"alerts-a.pb", 1438247636},
+                                                                 {"alerts-b.pb", 1438260927},
+                                                                 {"alerts-c.pb", 1438268951}}) {
+        const Answer answer({source(bytesOf(folder / file), now)},
+                            {std::nullopt, now, "en", false});
+        EXPECT_EQ(answer.disturbed(), "") << file;
+        EXPECT_FALSE(answer.line("R1").isUnknown) << file;
+        const AlertStatistics& statistics = answer.result().statistics;
+        EXPECT_EQ(statistics.count(AlertCount::Alerts), 6U) << file;
+        EXPECT_EQ(statistics.count(AlertCount::Incidents), 2U) << file;
+        EXPECT_EQ(statistics.count(AlertCount::AlertsOfNoLine), 6U) << file;
+    }
+    EXPECT_FALSE(Answer({source(bytesOf(folder / "empty.pb"), 1438266085)},
+                        {std::nullopt, 1438266085, "en", false})
+                     .line("R1")
+                     .isUnknown);
+}
+
+TEST_F(CapturedFeeds, TheBelgianRailwaysEscapeTheirMarkupTwice) {
+    constexpr std::uint64_t now = 1438247636;
+    const auto bytes =
+        alsoNaming("R1", bytesOf(capturedFeeds() / "irail-nmbs-2015" / "alerts-a.pb"), now);
+    const auto find = [&](const char* language, const std::string& title) {
+        const Answer answer({source(bytes, now)}, {std::nullopt, now, language, false});
+        EXPECT_EQ(answer.incidents("R1").size(), 2U);
+        for (const auto& incident : answer.incidents("R1"))
+            if (incident->title() == title)
+                return incident;
+        throw std::out_of_range(title + " is not among them");
+    };
+    const auto english = find("en", "La Louviere-Sud - Pieton: Overhead power line damage.");
+    EXPECT_EQ(english->summary(), "Overhead power line damage.");
+    EXPECT_EQ(english->fullDescription(),
+              "Overhead power line damage.\n\nDelayed train traffic.\n\n"
+              "Trains on one track between La Louviere-Sud and Morlanwelz.\n\n"
+              "Delays and cancellations are possible.\n"
+              "Disruption for an undetermined amount of time.\n\n"
+              "Listen to the announcements in the train.\n"
+              "Listen to the announcements in the train station.\n"
+              "Listen to the announcements in the train.");
+    const auto french = find("fr-BE", "La Louviere-Sud - Pieton: Dégâts à la caténaire.");
+    EXPECT_EQ(french->summary(), "Dégâts à la caténaire.");
+    EXPECT_EQ(french->muid(), english->muid());
+    const auto dutch = find("nl", "La Louviere-Zuid - Pieton: Beschadiging aan de bovenleiding.");
+    EXPECT_EQ(dutch->muid(), english->muid());
+    EXPECT_EQ(dutch->startDate(), nullptr);
+    EXPECT_EQ(dutch->endDate(), nullptr);
+    EXPECT_EQ(dutch->creationDate()->timeIntervalSince1970(), now);
 }
 
 TEST_F(CapturedFeeds, MiWayTellsTheSubstanceInTheDescription) {

@@ -24,9 +24,9 @@ TEST(UnknownIncident, NamesTheSystemAndTheAge) {
     const auto incident = unknown({UnknownStatus::Reason::SourceFailed, Now - 2100, "timed out"});
     EXPECT_EQ(incident->title(), "Status unknown");
     EXPECT_EQ(incident->summary(), "Metro, last known 35 minutes ago");
-    EXPECT_EQ(incident->fullDescription(),
-              "Metro, last known 35 minutes ago\n\nThe service alerts could not be read.\n\n"
-              "timed out");
+    EXPECT_EQ(
+        incident->fullDescription(),
+        "Metro, last known 35 minutes ago\n\nThe service alerts could not be read: timed out");
     EXPECT_EQ(incident->messageForRoutePlanning(), "Status unknown");
     EXPECT_EQ(incident->messageForRouteStepping(), "Status unknown");
     EXPECT_EQ(incident->messageForNonRoutable(), "Status unknown");
@@ -72,6 +72,19 @@ TEST(UnknownIncident, SaysWhy) {
     EXPECT_TRUE(why(Reason::LineDeparted).ends_with("not in the current schedule."));
     EXPECT_TRUE(why(Reason::ScheduleUnread).ends_with("The schedule could not be read."));
     EXPECT_TRUE(why(Reason::NothingToAsk).ends_with("no source of service alerts for this line."));
+}
+
+TEST(UnknownIncident, TheCauseStandsBehindAColonForItMayBeNoSentence) {
+    using Reason = UnknownStatus::Reason;
+    const auto why = [](Reason reason, const char* cause) {
+        return unknown({reason, std::nullopt, cause})->fullDescription().value_or("");
+    };
+    EXPECT_TRUE(why(Reason::SourceFailed, "it is empty")
+                    .ends_with("\n\nThe service alerts could not be read: it is empty"));
+    EXPECT_TRUE(why(Reason::ScheduleUnread, "/a/b: disk I/O error")
+                    .ends_with("\n\nThe schedule could not be read: /a/b: disk I/O error"));
+    EXPECT_TRUE(why(Reason::SelectorLost, "The schedule could not be asked.")
+                    .ends_with("It may concern this line.\n\nThe schedule could not be asked."));
 }
 
 TEST(UnknownIncident, AnAgeIsNeverNegative) {

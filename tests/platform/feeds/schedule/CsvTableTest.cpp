@@ -29,7 +29,7 @@ TEST_F(CsvTableTest, FindsColumnsInAnyOrderQuotedAndWithExtraOnes) {
     EXPECT_EQ(table->rowNumber(), 2U);
 }
 
-TEST_F(CsvTableTest, ReadsAMissingColumnAndAShortRowAsEmpty) {
+TEST_F(CsvTableTest, ReadsWhatAShortRowLacksAsEmptyAndALongRowUpToItsLastColumn) {
     open("stop_id,stop_name\nS1\nS2,Name,more,and more\n");
     EXPECT_EQ(table->column("zone_id"), CsvTable::NoColumn);
     ASSERT_TRUE(table->next(error));
