@@ -1,5 +1,7 @@
 #include "platform/foundation/AtomicFile.h"
 
+#include "platform/foundation/FileDescriptor.h"
+
 #include <array>
 #include <cerrno>
 #include <fcntl.h>
@@ -11,24 +13,6 @@
 namespace orvo::AtomicFile {
 
 namespace {
-
-class Descriptor {
-public:
-    explicit Descriptor(int number)
-        : _number(number) {}
-    Descriptor(const Descriptor&) = delete;
-    Descriptor& operator=(const Descriptor&) = delete;
-    ~Descriptor() {
-        if (_number >= 0)
-            close(_number);
-    }
-
-    [[nodiscard]] int number() const { return _number; }
-    [[nodiscard]] bool isOpen() const { return _number >= 0; }
-
-private:
-    int _number;
-};
 
 /// 0, or the reason in `errno`'s numbers.
 int writeWhole(int descriptor, std::span<const std::uint8_t> bytes) {
@@ -44,7 +28,7 @@ int writeWhole(int descriptor, std::span<const std::uint8_t> bytes) {
 
 int writeAside(const std::filesystem::path& path, std::span<const std::uint8_t> bytes) {
     // What a killed writer left behind under this name is cut off.
-    const Descriptor file(
+    const FileDescriptor file(
         open(path.c_str(), O_WRONLY | O_CREAT | O_TRUNC | O_CLOEXEC | O_NOFOLLOW, 0600));
     if (!file.isOpen() || fchmod(file.number(), 0600) != 0)
         return errno;
@@ -54,7 +38,7 @@ int writeAside(const std::filesystem::path& path, std::span<const std::uint8_t> 
 }
 
 int flushFolder(const std::filesystem::path& path) {
-    const Descriptor folder(open(path.c_str(), O_RDONLY | O_DIRECTORY | O_CLOEXEC));
+    const FileDescriptor folder(open(path.c_str(), O_RDONLY | O_DIRECTORY | O_CLOEXEC));
     if (!folder.isOpen())
         return errno;
     // Some file systems cannot flush a folder, and say so; there is nothing more to do there.
@@ -77,7 +61,7 @@ std::shared_ptr<NSError> systemError(const std::filesystem::path& path, int code
 
 std::shared_ptr<NSData> read(const std::filesystem::path& path, std::shared_ptr<NSError>* error) {
     // Opening a pipe that nobody writes to would wait without an end.
-    const Descriptor file(open(path.c_str(), O_RDONLY | O_CLOEXEC | O_NONBLOCK));
+    const FileDescriptor file(open(path.c_str(), O_RDONLY | O_CLOEXEC | O_NONBLOCK));
     if (!file.isOpen()) {
         if (errno != ENOENT)
             setError(error, path, errno);

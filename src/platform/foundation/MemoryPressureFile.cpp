@@ -1,5 +1,7 @@
 #include "platform/foundation/MemoryPressureFile.h"
 
+#include "platform/foundation/FileDescriptor.h"
+
 #include <array>
 #include <charconv>
 #include <fcntl.h>
@@ -19,39 +21,24 @@ constexpr std::string_view WarningTrigger = "some 150000 2000000";
 constexpr std::string_view CriticalTrigger = "full 100000 2000000";
 constexpr std::size_t LargestEventsFile = 4096;
 
-class FileDescriptor {
-public:
-    FileDescriptor(const std::filesystem::path& path, int flags)
-        : _fd(::open(path.c_str(), flags | O_CLOEXEC | O_NONBLOCK)) {}
-    FileDescriptor(const FileDescriptor&) = delete;
-    FileDescriptor& operator=(const FileDescriptor&) = delete;
-    FileDescriptor(FileDescriptor&& other) noexcept
-        : _fd(std::exchange(other._fd, -1)) {}
-    FileDescriptor& operator=(FileDescriptor&&) = delete;
-    ~FileDescriptor() {
-        if (_fd >= 0)
-            ::close(_fd);
-    }
-    [[nodiscard]] int get() const noexcept { return _fd; }
-
-private:
-    int _fd;
-};
+FileDescriptor openFile(const std::filesystem::path& path, int flags) {
+    return FileDescriptor(::open(path.c_str(), flags | O_CLOEXEC | O_NONBLOCK));
+}
 
 /// The trigger stands as long as the file is open.
 class PressureTrigger final : public MemoryPressureFile {
 public:
     explicit PressureTrigger(FileDescriptor file)
         : _file(std::move(file)) {}
-    int fileDescriptor() const noexcept override { return _file.get(); }
+    int fileDescriptor() const noexcept override { return _file.number(); }
     bool hasHappened() override { return true; }
 
     static std::unique_ptr<MemoryPressureFile> open(const std::filesystem::path& path,
                                                     std::string_view trigger) {
-        FileDescriptor file(path, O_RDWR);
+        auto file = openFile(path, O_RDWR);
         // The kernel wants the text with its final zero.
         const std::string text(trigger);
-        if (file.get() < 0 || ::write(file.get(), text.c_str(), text.size() + 1) < 0)
+        if (!file.isOpen() || ::write(file.number(), text.c_str(), text.size() + 1) < 0)
             return nullptr;
         return std::make_unique<PressureTrigger>(std::move(file));
     }
@@ -66,7 +53,7 @@ public:
         : _file(std::move(file))
         , _degree(degree)
         , _count(count()) {}
-    int fileDescriptor() const noexcept override { return _file.get(); }
+    int fileDescriptor() const noexcept override { return _file.number(); }
     /// Reading also makes the file wait for its next change.
     bool hasHappened() override {
         const auto before = std::exchange(_count, count());
@@ -76,7 +63,7 @@ public:
 private:
     [[nodiscard]] std::uint64_t count() const {
         std::array<char, LargestEventsFile> text{};
-        const auto size = ::pread(_file.get(), text.data(), text.size(), 0);
+        const auto size = ::pread(_file.number(), text.data(), text.size(), 0);
         return size > 0 ? eventCount({text.data(), static_cast<std::size_t>(size)}, _degree) : 0;
     }
 
@@ -117,8 +104,8 @@ std::unique_ptr<MemoryPressureFile> openOfKernel(MemoryPressure degree) {
     }
     if (places.controlGroup.empty())
         return nullptr;
-    FileDescriptor file(places.controlGroup / "memory.events", O_RDONLY);
-    return file.get() < 0 ? nullptr : std::make_unique<GroupEvents>(std::move(file), degree);
+    auto file = openFile(places.controlGroup / "memory.events", O_RDONLY);
+    return file.isOpen() ? std::make_unique<GroupEvents>(std::move(file), degree) : nullptr;
 }
 
 } // namespace

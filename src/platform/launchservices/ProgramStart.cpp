@@ -1,5 +1,7 @@
 #include "platform/launchservices/ProgramStart.h"
 
+#include "platform/foundation/FileDescriptor.h"
+
 #include <cerrno>
 #include <fcntl.h>
 #include <spawn.h>
@@ -14,22 +16,6 @@ extern char**
 namespace orvo {
 
 namespace {
-
-class Descriptor {
-public:
-    explicit Descriptor(int number)
-        : _number(number) {}
-    Descriptor(const Descriptor&) = delete;
-    Descriptor& operator=(const Descriptor&) = delete;
-    ~Descriptor() {
-        if (_number >= 0)
-            close(_number);
-    }
-    [[nodiscard]] int number() const noexcept { return _number; }
-
-private:
-    int _number;
-};
 
 /// A file without a name that holds the bytes, to be read from its start: unlike a pipe it never
 /// makes the writer wait.
@@ -56,7 +42,7 @@ int openInput(const std::shared_ptr<NSData>& input) {
 int startProgram(const std::filesystem::path& program,
                  const std::vector<std::string>& arguments,
                  const std::shared_ptr<NSData>& input) {
-    const Descriptor standardInput(openInput(input));
+    const FileDescriptor standardInput(openInput(input));
     if (standardInput.number() < 0)
         return errno;
     std::string name = program.string();
