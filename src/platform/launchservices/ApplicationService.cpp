@@ -3,6 +3,7 @@
 #include "platform/foundation/RunLoop.h"
 #include "platform/launchservices/ApplicationBus.h"
 #include "platform/launchservices/ApplicationLauncher.h"
+#include "platform/launchservices/private/BusEndListener.h"
 
 #include <QDBusConnection>
 #include <QDBusConnectionInterface>
@@ -11,6 +12,7 @@
 #include <QDBusVirtualObject>
 
 #include <fmt/format.h>
+#include <optional>
 
 namespace orvo {
 
@@ -46,21 +48,9 @@ std::shared_ptr<NSData> dataOf(const QByteArray& bytes) {
 }
 
 class ApplicationObject final : public QDBusVirtualObject {
-    Q_OBJECT
-
 public:
     explicit ApplicationObject(ApplicationRequestHandler& handler)
         : _handler(handler) {}
-
-    /// The connection itself tells of its end, as a signal of a bus that there is not.
-    void listenForEndOf(QDBusConnection& bus) {
-        bus.connect(QString(),
-                    "/org/freedesktop/DBus/Local",
-                    "org.freedesktop.DBus.Local",
-                    "Disconnected",
-                    this,
-                    SLOT(busIsGone()));
-    }
 
     [[nodiscard]] QString introspect(const QString&) const override { return Introspection; }
 
@@ -72,9 +62,6 @@ public:
             connection.send(answer);
         return true;
     }
-
-private Q_SLOTS:
-    void busIsGone() { _handler.busIsGone(); }
 
 private:
     QDBusMessage answerTo(const QDBusMessage& message) {
@@ -146,6 +133,7 @@ struct ApplicationService::Private {
     QString name;
     QString path;
     ApplicationObject object;
+    std::optional<BusEndListener> busEnd;
 };
 
 std::unique_ptr<ApplicationService>
@@ -174,7 +162,7 @@ ApplicationService::start(const std::string& applicationIdentifier,
                  fmt::format("{} runs already on this session bus.", applicationIdentifier));
         return nullptr;
     }
-    fields->object.listenForEndOf(bus);
+    fields->busEnd.emplace(bus, [&handler] { handler.busIsGone(); });
     return std::unique_ptr<ApplicationService>(new ApplicationService(std::move(fields)));
 }
 
@@ -195,5 +183,3 @@ ApplicationService::~ApplicationService() {
 }
 
 } // namespace orvo
-
-#include "ApplicationService.moc"
