@@ -284,6 +284,7 @@ void FavoritesView::showResults() {
         return;
     const auto text = _search->text().trimmed();
     if (text.isEmpty()) {
+        _results->clear(); // assistive tools are told of pages that are not shown, too
         _pages->setCurrentWidget(_list->count() > 0 ? _listPage : _emptyPage);
         return;
     }

@@ -240,6 +240,7 @@ class Voices(AssistiveTools, WindowTest):
         self.hears(process, "push button", "Clear the search", field)
         self.keys(window, "Return")
         self.eventually(lambda: self.rows(process, "Favorites") == [*known, found], "the line that was found is among them")
+        self.eventually(lambda: self.rows(process, "Lines found") == [], "what was found is told of no more")
         self.keys(window, "Down", "Delete")
         self.hears(process, "push button", field, "Move Up", "Move Down", "Remove", "Undo")
 

@@ -2,10 +2,12 @@
 
 #include "orvo/window/WindowWorld.h"
 
+#include <QAccessible>
 #include <QKeyEvent>
 #include <QLabel>
 #include <QLineEdit>
 #include <QListWidget>
+#include <QMouseEvent>
 #include <QPushButton>
 
 namespace orvo {
@@ -107,6 +109,36 @@ TEST_F(FavoritesViewTest, AFavoriteThatIsFoundIsMarkedAndNotAddedTwice) {
     press(search, Qt::Key_Return);
     EXPECT_EQ(kept(), "M1 4 7");
     EXPECT_TRUE(says("is a favorite already."));
+}
+
+TEST_F(FavoritesViewTest, AssistiveToolsAreToldOfNothingFoundOnceTheSearchFieldIsEmpty) {
+    auto* const told = QAccessible::queryAccessibleInterface(results);
+    ASSERT_TRUE(told);
+    const auto rowsToldOf = [&](const char* text) {
+        search->setText(text);
+        return told->childCount();
+    };
+    EXPECT_EQ(rowsToldOf(""), 0);
+    EXPECT_GT(rowsToldOf("12"), 0);
+    EXPECT_EQ(rowsToldOf(""), 0);
+    EXPECT_GT(rowsToldOf("M1"), 0);
+    EXPECT_EQ(rowsToldOf("  "), 0);
+    EXPECT_EQ(results->count(), 0);
+    search->setText("12");
+    press(search, Qt::Key_Return);
+    EXPECT_EQ(told->childCount(), 0) << "adding a line empties the field";
+}
+
+TEST_F(FavoritesViewTest, ALineThatIsClickedIsAddedAndNothingFoundIsLeft) {
+    search->setText("12");
+    ASSERT_GT(results->count(), 0);
+    const QPointF point = results->visualItemRect(results->item(0)).center();
+    for (const auto type : {QEvent::MouseButtonPress, QEvent::MouseButtonRelease}) {
+        QMouseEvent event(type, point, point, Qt::LeftButton, Qt::LeftButton, Qt::NoModifier);
+        QCoreApplication::sendEvent(results->viewport(), &event);
+    }
+    EXPECT_EQ(kept(), "M1 4 7 12");
+    EXPECT_EQ(results->count(), 0);
 }
 
 TEST_F(FavoritesViewTest, ASearchThatFindsNothingSaysSo) {
