@@ -263,6 +263,18 @@ TEST_F(AnalyticsDelegateTest, OpeningCapturesTheTapThenEndsTheSession) {
     EXPECT_EQ(store->actions, (std::vector<std::int64_t>{9001}));
 }
 
+TEST_F(AnalyticsDelegateTest, WhatComesAfterTheEndLeavesTheCapturedRecordAsItWas) {
+    delegate->startSessionIfNeeded();
+    open(2);
+    const auto record = store->interactions.at(0).record;
+    show({line(1)}, {incident("a")});
+    open(5);
+    EXPECT_TRUE(record->transitIncidentItems().empty());
+    EXPECT_EQ(record->transitMessageType(), 0);
+    EXPECT_EQ(record->tappedItemIndex(), 2);
+    EXPECT_EQ(store->interactions.size(), 1U);
+}
+
 TEST_F(AnalyticsDelegateTest, OpeningWithoutASessionStillCapturesTheTapAlone) {
     open(0);
     EXPECT_EQ(store->calls, (std::vector<std::string>{"action 9001"}));
