@@ -69,6 +69,24 @@ TEST_F(ControllerSteps, DisappearingSavesLeavesDropsTheUpdaterAndIsHiddenThen) {
     EXPECT_EQ(controller->request(), nullptr);
 }
 
+TEST_F(ControllerSteps, WhileItSavesItIsStillRegisteredAndWatched) {
+    loadWithDoubles();
+    const auto before = observers();
+    controller->viewWillAppear(false);
+    runUntilFetched();
+    int saves = 0;
+    const auto looking = Log::sink().overrideWith([&](const LogRecord& record) {
+        if (record.format != "Saving view model to NSUserDefault (key: %{private}@) : %{private}@")
+            return;
+        ++saves;
+        EXPECT_EQ(observers(), before + 1);
+        EXPECT_TRUE(controller->updater());
+    });
+    controller->viewWillDisappear(false);
+    EXPECT_EQ(saves, 1);
+    EXPECT_EQ(observers(), before);
+}
+
 TEST_F(ControllerSteps, AFailureIsAnsweredToWhoBeganTheFetchAndToWhoJoinedIt) {
     saveFavorites({1});
     lookup->answerWith({nullptr, someError()});

@@ -94,9 +94,9 @@ TEST_F(WidgetController, LoadingMakesAPlainTableServedByTheDataSource) {
     EXPECT_EQ(table->superview(), view);
 }
 
-TEST_F(WidgetController, LoadingFitsTheHostsWidthAndRows) {
+TEST_F(WidgetController, LoadingFitsTheHostsCompactWidthAndItsRows) {
     context->compactMaximum = {300, 110};
-    context->expandedMaximum = {300, 300};
+    context->expandedMaximum = {340, 300};
     controller = makeController();
     (void)controller->view();
     EXPECT_EQ(controller->dataSource()->availableWidth(), 300);
