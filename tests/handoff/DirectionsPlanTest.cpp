@@ -1,5 +1,7 @@
 #include "handoff/DirectionsPlan.h"
 
+#include "handoff/EncodedMessage.h"
+
 #include <gtest/gtest.h>
 
 #include <cmath>
@@ -7,13 +9,8 @@
 namespace orvo {
 namespace {
 
-using Bytes = std::vector<std::uint8_t>;
-
-Bytes encoded(const ProtoCodable& message) {
-    ProtoWriter writer;
-    message.writeTo(writer);
-    return writer.bytes();
-}
+using testing::Bytes;
+using testing::encoded;
 
 template <class Set>
 Bytes planWith(Set&& set) {

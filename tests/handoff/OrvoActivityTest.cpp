@@ -1,5 +1,6 @@
 #include "handoff/OrvoActivity.h"
 
+#include "handoff/EncodedMessage.h"
 #include "platform/foundation/Exceptions.h"
 #include "platform/geoservices/TransitLineItemRecord.h"
 
@@ -8,13 +9,8 @@
 namespace orvo {
 namespace {
 
-using Bytes = std::vector<std::uint8_t>;
-
-Bytes encoded(const ProtoCodable& message) {
-    ProtoWriter writer;
-    message.writeTo(writer);
-    return writer.bytes();
-}
+using testing::Bytes;
+using testing::encoded;
 
 template <class Set>
 Bytes activityWith(Set&& set) {
