@@ -3,6 +3,7 @@
 #include "orvo/FavoritesListCommand.h"
 #include "orvo/HandOffPage.h"
 #include "orvo/console/DisplayText.h"
+#include "orvo/console/Paragraph.h"
 #include "orvo/console/PeriodText.h"
 
 #include <algorithm>
@@ -13,8 +14,6 @@
 namespace orvo {
 
 namespace {
-
-constexpr std::size_t WidestText = 100;
 
 /// The names of the lines that an incident concerns, as far as they are known here.
 std::string affectedLines(const IncidentPage::Incident& incident) {
@@ -100,18 +99,15 @@ void HandOffPrinter::printIncident(const IncidentPage::Incident& incident, Lengt
 }
 
 void HandOffPrinter::printParagraphs(const std::string& text, Terminal::Style style) const {
-    const auto& settings = _context.terminal().settings();
-    const std::size_t columns =
-        settings.outputIsTerminal ? std::min(settings.width, WidestText) - 2 : std::string::npos;
-    auto& output = _context.terminal().output();
+    const auto& terminal = _context.terminal();
     for (std::size_t start = 0; start < text.size();) {
         const auto end = std::min(text.find('\n', start), text.size());
-        const auto lines = DisplayText::wrap(
-            DisplayText::oneLine(std::string_view(text).substr(start, end - start)), columns);
-        for (const auto& line : lines)
-            output << "  " << _context.terminal().styled(line, style) << '\n';
-        if (lines.empty())
-            output << '\n';
+        const auto paragraph =
+            DisplayText::oneLine(std::string_view(text).substr(start, end - start));
+        if (paragraph.empty())
+            terminal.output() << '\n';
+        else
+            printParagraph(terminal, paragraph, style);
         start = end + 1;
     }
 }

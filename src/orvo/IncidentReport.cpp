@@ -3,6 +3,7 @@
 #include "fetching/DebugTransitLineItem.h"
 #include "orvo/JsonParts.h"
 #include "orvo/console/DisplayText.h"
+#include "orvo/console/PeriodText.h"
 #include "platform/favorites/StoredTransitLine.h"
 #include "platform/favorites/TransitStorageIncident.h"
 #include "platform/feeds/schedule/ScheduleStore.h"
@@ -13,10 +14,6 @@
 namespace orvo {
 
 namespace {
-
-std::optional<double> epochSecondsOf(const std::shared_ptr<NSDate>& date) {
-    return date ? std::optional(date->timeIntervalSince1970()) : std::nullopt;
-}
 
 std::optional<FeedLineOrigin> originOf(const TransitLineItem& item,
                                        const ScheduleStore* schedules) {
@@ -51,8 +48,8 @@ IncidentReport::Incident IncidentReport::incidentOf(const TransitIncident& incid
     return {incident.muid(),
             incident.title().value_or(""),
             incident.summary().value_or(""),
-            epochSecondsOf(incident.startDate()),
-            epochSecondsOf(incident.endDate()),
+            PeriodText::secondsOf(incident.startDate()),
+            PeriodText::secondsOf(incident.endDate()),
             nameOf(details.severity),
             nameOf(details.effect),
             details.isPartOfLine,

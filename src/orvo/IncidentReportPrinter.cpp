@@ -1,6 +1,7 @@
 #include "orvo/IncidentReportPrinter.h"
 
 #include "orvo/console/DisplayText.h"
+#include "orvo/console/Paragraph.h"
 #include "orvo/console/PeriodText.h"
 
 #include <algorithm>
@@ -10,8 +11,6 @@
 namespace orvo {
 
 namespace {
-
-constexpr std::size_t WidestReport = 100;
 
 bool isComing(const IncidentReport::Incident& incident, double now) {
     return incident.start && *incident.start > now;
@@ -44,7 +43,7 @@ void IncidentReportPrinter::printLine(const IncidentReport::Line& line, double n
         return isComing(incident, now);
     };
     if (std::ranges::all_of(line.incidents, comes))
-        printParagraph("Good service", Terminal::Style::Good);
+        printParagraph(_terminal, "Good service", Terminal::Style::Good);
     for (const auto& incident : line.incidents) {
         if (!comes(incident))
             printIncident(incident, now);
@@ -58,20 +57,15 @@ void IncidentReportPrinter::printLine(const IncidentReport::Line& line, double n
 void IncidentReportPrinter::printIncident(const IncidentReport::Incident& incident,
                                           double now) const {
     const bool coming = isComing(incident, now);
-    printParagraph(coming ? "Coming: " + incident.title : incident.title,
+    printParagraph(_terminal,
+                   coming ? "Coming: " + incident.title : incident.title,
                    coming ? Terminal::Style::Faint : Terminal::Style::Advisory);
-    printParagraph(incident.summary, coming ? Terminal::Style::Faint : Terminal::Style::Plain);
+    printParagraph(
+        _terminal, incident.summary, coming ? Terminal::Style::Faint : Terminal::Style::Plain);
     if (!incident.isUnknown)
-        printParagraph(PeriodText::period(incident.start, incident.end, now, incident.timeZone),
+        printParagraph(_terminal,
+                       PeriodText::period(incident.start, incident.end, now, incident.timeZone),
                        Terminal::Style::Faint);
-}
-
-void IncidentReportPrinter::printParagraph(const std::string& text, Terminal::Style style) const {
-    const bool isPipe = !_terminal.settings().outputIsTerminal;
-    const std::size_t columns =
-        isPipe ? std::string::npos : std::min(_terminal.settings().width, WidestReport) - 2;
-    for (const auto& line : DisplayText::wrap(DisplayText::oneLine(text), columns))
-        _terminal.output() << "  " << _terminal.styled(line, style) << '\n';
 }
 
 } // namespace orvo

@@ -21,8 +21,6 @@ public:
 private:
     void printLine(const IncidentReport::Line& line, double now) const;
     void printIncident(const IncidentReport::Incident& incident, double now) const;
-    /// Broken to the width where a person looks, one line in a pipe.
-    void printParagraph(const std::string& text, Terminal::Style style) const;
 
     const Terminal& _terminal;
 };

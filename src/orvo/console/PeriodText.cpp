@@ -1,5 +1,6 @@
 #include "orvo/console/PeriodText.h"
 
+#include "platform/foundation/NSDate.h"
 #include "platform/foundation/Text.h"
 
 #include <unicode/calendar.h>
@@ -54,6 +55,10 @@ double dayAfter(double time, const icu::TimeZone& zone) {
 }
 
 } // namespace
+
+std::optional<double> secondsOf(const std::shared_ptr<NSDate>& date) {
+    return date ? std::optional(date->timeIntervalSince1970()) : std::nullopt;
+}
 
 std::string moment(double time, double now, const std::optional<std::string>& timeZone) {
     const auto zone = zoneNamed(timeZone);

@@ -1,13 +1,19 @@
 #pragma once
 
+#include <memory>
 #include <optional>
 #include <string>
 
 namespace orvo {
 
+class NSDate;
+
 /// Periods of time in words, with the clock and calendar of a place and the number formats of the
 /// person's language.
 namespace PeriodText {
+
+/// Seconds since 1970; nothing for nil.
+[[nodiscard]] std::optional<double> secondsOf(const std::shared_ptr<NSDate>& date);
 
 /// Seconds since 1970; a missing end is open. `now` decides between what has begun and what is
 /// coming, and how much of a date need be said. `timeZone` is an IANA name; nothing, or one that

@@ -5,7 +5,6 @@
 #include "orvo/window/WindowTexts.h"
 #include "platform/feeds/schedule/ScheduleStore.h"
 #include "platform/foundation/NSArray.h"
-#include "platform/foundation/NSDate.h"
 
 #include <algorithm>
 #include <unordered_set>
@@ -13,10 +12,6 @@
 namespace orvo {
 
 namespace {
-
-std::optional<double> secondsOf(const std::shared_ptr<NSDate>& date) {
-    return date ? std::optional(date->timeIntervalSince1970()) : std::nullopt;
-}
 
 /// The summary is looked for at the beginning however the lines of the two are broken.
 std::string wholeText(const std::string& summary, const std::string& description) {
@@ -48,8 +43,8 @@ IncidentPage::Incident incidentOf(const TransitStorageIncident& incident,
                                   const ScheduleStore* schedules) {
     IncidentPage::Incident result;
     result.title = DisplayText::oneLine(incident.title().value_or(""));
-    result.start = secondsOf(incident.startDate());
-    result.end = secondsOf(incident.endDate());
+    result.start = PeriodText::secondsOf(incident.startDate());
+    result.end = PeriodText::secondsOf(incident.endDate());
     result.summary = incident.summary().value_or("");
     result.text = wholeText(result.summary, incident.fullDescription().value_or(""));
     if (const auto details = incident.details()) {

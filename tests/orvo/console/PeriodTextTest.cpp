@@ -1,6 +1,7 @@
 #include "orvo/console/PeriodText.h"
 
 #include "platform/foundation/ISO8601.h"
+#include "platform/foundation/NSDate.h"
 #include "platform/foundation/Text.h"
 
 #include <gtest/gtest.h>
@@ -21,6 +22,11 @@ protected:
     EnvironmentSlot<std::string>::Override language = Text::locale().overrideWith("de");
     double now = at("2024-07-24T10:00:00Z");
 };
+
+TEST_F(PeriodTextTest, DatesAreSecondsSince1970AndNilIsNone) {
+    EXPECT_EQ(PeriodText::secondsOf(NSDate::dateWithTimeIntervalSince1970(1234.5)), 1234.5);
+    EXPECT_EQ(PeriodText::secondsOf(nullptr), std::nullopt);
+}
 
 TEST_F(PeriodTextTest, UsesTheClockOfThePlace) {
     EXPECT_EQ(period({}, at("2024-07-24T12:30:00Z")), "until 14:30");
