@@ -17,8 +17,8 @@ CommandSpec DefaultsWriteCommand::spec() const {
                        "makes up none, one or two of them.",
         .operands = {{.name = "KEY", .help = ""},
                      {.name = "VALUE",
-                      .help =
-                          "true and false are truth values, numbers are numbers, all else text"}},
+                      .help = "true, false, yes and no are truth values, numbers are numbers, all "
+                              "else text"}},
         .options = {{.name = "type",
                      .value = "KIND",
                      .help = "read VALUE as bool, integer, real or string",
