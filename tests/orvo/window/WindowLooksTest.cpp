@@ -2,7 +2,9 @@
 
 #include "orvo/window/LineMark.h"
 #include "orvo/window/WindowWorld.h"
+#include "platform/uikit/text/private/ProgramFonts.h"
 
+#include <QFontDatabase>
 #include <QImage>
 
 #include <cmath>
@@ -96,6 +98,14 @@ TEST_F(WindowLooksTest, ImagesAreInTheColourThatIsAskedFor) {
     EXPECT_TRUE(holds(WindowLooks::magnifier(color, 4)));
     EXPECT_EQ(WindowLooks::magnifier(color, 4).deviceIndependentSize(), QSizeF(16, 16));
     EXPECT_TRUE(WindowLooks::fixedImage("no such image", 18, color, 1).isNull());
+}
+
+TEST_F(WindowLooksTest, TheFontsOfTheDesktopStayThereBesideThoseOfShields) {
+    const auto families = QFontDatabase::families();
+    EXPECT_NE(ProgramFonts::faceOf(600).family, "");
+    EXPECT_TRUE(ProgramFonts::haveSystemFonts());
+    for (const auto& family : families)
+        EXPECT_TRUE(QFontDatabase::families().contains(family)) << family.toStdString();
 }
 
 } // namespace

@@ -25,6 +25,11 @@ constexpr std::array Files{FaceFile{400, "/usr/share/fonts/opentype/inter/Inter-
 constexpr int NeverLookedAtAgain = 0;
 constexpr char16_t LastPlainCharacter = 0x7E; // every font has the characters until this one
 
+/// Line breaks have no glyph, and the toolkit looks for none.
+bool isLineBreak(char32_t character) {
+    return character == QChar::LineSeparator || character == QChar::ParagraphSeparator;
+}
+
 bool showsToolkitWidgets() {
     return QCoreApplication::instance()->inherits("QApplication");
 }
@@ -96,7 +101,7 @@ private:
                 character = QChar::surrogateToUcs4(text[i], text[i + 1]);
                 ++i;
             }
-            if (!isInEveryFace(character))
+            if (!isLineBreak(character) && !isInEveryFace(character))
                 return true;
         }
         return false;
