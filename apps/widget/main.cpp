@@ -2,6 +2,7 @@
 #include "platform/extension/NSExtensionMain.h"
 #include "platform/extension/window/DesktopApplication.h"
 #include "platform/extension/window/DesktopWidget.h"
+#include "platform/settings/DesktopDisplay.h"
 #include "print/WidgetProgram.h"
 
 #include <iostream>
@@ -13,7 +14,7 @@ namespace {
 constexpr const char* DesktopFile = "com.zentu.Orvo.TransitWidget";
 
 std::optional<orvo::WidgetWindowing> windowing() {
-    if (!orvo::haveDisplay())
+    if (!orvo::DesktopDisplay::isThere())
         return std::nullopt;
     return orvo::WidgetWindowing{
         .makeApplication = [] { orvo::makeDesktopApplication(DesktopFile); },

@@ -160,7 +160,7 @@ ExitCode Program::runCommand(std::size_t index, const std::vector<std::string>& 
     Command& command = *_commands[index];
     // First of all: what the options ask for may need an application object, and would make one
     // that can have no windows.
-    if (command.showsWindows() && WindowApplication::haveDisplay())
+    if (command.showsWindows())
         WindowApplication::make();
     if (const auto code = applyGlobalOptions(arguments, command))
         return *code;

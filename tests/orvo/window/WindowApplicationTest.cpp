@@ -2,81 +2,42 @@
 
 #include "orvo/window/WindowWorld.h"
 
-#include <cstdlib>
-#include <cstring>
-#include <map>
-#include <sys/socket.h>
-#include <sys/un.h>
-#include <unistd.h>
+#include <array>
+#include <string>
 
 namespace orvo {
 namespace {
 
-/// The variables that tell of displays; as they were at the end.
+/// Whoever comes first in a process makes its application object, so CTest's processes count.
 class WindowApplicationTest : public ::testing::Test {
 protected:
     void SetUp() override {
-        for (const char* name :
-             {"DISPLAY", "WAYLAND_DISPLAY", "XDG_RUNTIME_DIR", "QT_QPA_PLATFORM"}) {
-            const char* value = std::getenv(name);
-            before[name] = value ? std::optional<std::string>(value) : std::nullopt;
-            unsetenv(name);
-        }
+        if (QCoreApplication::instance())
+            GTEST_SKIP() << "another test has made the application object";
     }
-    void TearDown() override {
-        for (const auto& [name, value] : before)
-            value ? setenv(name.c_str(), value->c_str(), 1) : unsetenv(name.c_str());
-    }
-
-    /// A compositor's socket of that name, as long as it is open.
-    void listenAt(const std::string& name) {
-        sockaddr_un address{};
-        address.sun_family = AF_UNIX;
-        const auto path = (folder.path() / name).string();
-        ASSERT_LT(path.size(), sizeof(address.sun_path));
-        std::memcpy(address.sun_path, path.data(), path.size());
-        listener = socket(AF_UNIX, SOCK_STREAM | SOCK_CLOEXEC, 0);
-        ASSERT_EQ(bind(listener, reinterpret_cast<const sockaddr*>(&address), sizeof(address)), 0);
-        ASSERT_EQ(listen(listener, 1), 0);
-        setenv("XDG_RUNTIME_DIR", folder.path().c_str(), 1);
-        setenv("WAYLAND_DISPLAY", name.c_str(), 1);
-    }
-
-    std::map<std::string, std::optional<std::string>> before;
-    testing::TemporaryFolder folder;
-    int listener = -1;
 };
 
-TEST_F(WindowApplicationTest, WithoutAVariableThereIsNoDisplay) {
-    EXPECT_FALSE(WindowApplication::haveDisplay());
+TEST_F(WindowApplicationTest, WhereNobodyWouldSeeWindowsNothingIsMade) {
+    WindowApplication::make(); // tests have a platform that nobody sees
+    EXPECT_EQ(QCoreApplication::instance(), nullptr);
+    EXPECT_FALSE(WindowApplication::isMade());
 }
 
-TEST_F(WindowApplicationTest, ADisplayThatAnswersIsOne) {
-    listenAt("wayland-7");
-    EXPECT_TRUE(WindowApplication::haveDisplay());
-    setenv("WAYLAND_DISPLAY", (folder.path() / "wayland-7").c_str(), 1);
-    EXPECT_TRUE(WindowApplication::haveDisplay());
-    close(listener);
-    EXPECT_FALSE(WindowApplication::haveDisplay());
+TEST_F(WindowApplicationTest, AnApplicationObjectThatIsThereStays) {
+    ASSERT_TRUE(testing::haveWindowApplication());
+    auto* const before = QCoreApplication::instance();
+    WindowApplication::make();
+    EXPECT_EQ(QCoreApplication::instance(), before);
+    EXPECT_TRUE(WindowApplication::isMade());
 }
 
-TEST_F(WindowApplicationTest, ADisplayThatHasGoneIsNone) {
-    setenv("XDG_RUNTIME_DIR", folder.path().c_str(), 1);
-    setenv("WAYLAND_DISPLAY", "wayland-8", 1);
-    setenv("DISPLAY", ":94321", 1);
-    EXPECT_FALSE(WindowApplication::haveDisplay());
-}
-
-TEST_F(WindowApplicationTest, ADisplayOnAnotherMachineIsTakenAtItsWord) {
-    setenv("DISPLAY", "there:10.0", 1);
-    EXPECT_TRUE(WindowApplication::haveDisplay());
-}
-
-TEST_F(WindowApplicationTest, WhereNothingIsSeenThereIsNoDisplay) {
-    listenAt("wayland-7");
-    setenv("QT_QPA_PLATFORM", "offscreen", 1);
-    EXPECT_FALSE(WindowApplication::haveDisplay());
-    close(listener);
+TEST_F(WindowApplicationTest, AnApplicationObjectWithoutWindowsIsNone) {
+    int count = 1;
+    std::string name = "test";
+    std::array<char*, 2> words = {name.data(), nullptr};
+    const QCoreApplication withoutWindows(count, words.data());
+    WindowApplication::make();
+    EXPECT_FALSE(WindowApplication::isMade());
 }
 
 } // namespace

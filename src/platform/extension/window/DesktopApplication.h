@@ -4,15 +4,11 @@
 
 namespace orvo {
 
-/// Whether the environment names a display that windows can be shown on. One of this machine must
-/// be served by somebody: a name that was left behind is none.
-[[nodiscard]] bool haveDisplay();
-
 /// Makes the program's application object, for windows, where there is none yet: quick to start,
 /// without the themes and graphics drivers that a card has no use for. `desktopFile` is the name of
 /// the program's desktop file, without its ending, by which desktops know its windows. A display
-/// that does not answer ends the process with the toolkit's own message, so ask `haveDisplay()`
-/// first. On the main thread, before its run loop is used.
+/// that does not answer ends the process with the toolkit's own message, so ask
+/// `DesktopDisplay::isThere()` first. On the main thread, before its run loop is used.
 void makeDesktopApplication(const std::string& desktopFile);
 
 } // namespace orvo
