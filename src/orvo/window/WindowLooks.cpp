@@ -11,8 +11,10 @@
 #include <QScreen>
 #include <QStyle>
 
+#include <array>
 #include <cmath>
 #include <span>
+#include <utility>
 
 namespace orvo {
 
@@ -22,6 +24,7 @@ constexpr double UsualPoints = 10.5;   // where no desktop says how large text i
 constexpr double UnscaledInch = 96.5;  // logical dots; a desktop that enlarges text has more
 constexpr double SeparatorPart = 0.2;  // of the secondary colour
 constexpr double HighlightPart = 0.08; // of the text's colour
+constexpr double FaintPart = 0.55;     // of the secondary colour, for what cannot be used now
 
 QColor hex(std::uint32_t rgb) {
     return QColor::fromRgb(rgb);
@@ -163,7 +166,7 @@ QString WindowLooks::styleSheet() const {
     const auto edge = mixed(card, secondary, 0.45).name();
     const auto button = mixed(card, text, isDark ? 0.1 : 0.04).name();
     const auto pressed = mixed(card, text, isDark ? 0.2 : 0.12).name();
-    const auto faint = mixed(card, secondary, 0.55).name();
+    const auto faint = mixed(card, secondary, FaintPart).name();
     return QString(R"(
 QLineEdit, QListWidget { border: 1px solid %1; border-radius: 8px; background: %2; }
 QLineEdit { padding: 7px 8px; }
@@ -182,29 +185,32 @@ QScrollBar::add-page, QScrollBar::sub-page { background: transparent; }
 }
 
 QPalette WindowLooks::palette() const {
+    const auto white = hex(0xFFFFFF);
+    const auto colors = std::to_array<std::pair<QPalette::ColorRole, QColor>>(
+        {{QPalette::Window, card},
+         {QPalette::WindowText, text},
+         {QPalette::Base, field},
+         {QPalette::AlternateBase, card},
+         {QPalette::Text, text},
+         {QPalette::PlaceholderText, secondary},
+         {QPalette::Button, mixed(card, text, isDark ? 0.1 : 0.03)},
+         {QPalette::ButtonText, text},
+         {QPalette::BrightText, text},
+         {QPalette::ToolTipBase, field},
+         {QPalette::ToolTipText, text},
+         {QPalette::Link, link},
+         {QPalette::LinkVisited, link},
+         {QPalette::Highlight, hex(isDark ? 0x3D6FB8 : 0x2F6FCF)},
+         {QPalette::HighlightedText, white},
+         {QPalette::Light, mixed(card, white, isDark ? 0.1 : 0.8)},
+         {QPalette::Midlight, mixed(card, white, isDark ? 0.06 : 0.5)},
+         {QPalette::Mid, mixed(card, text, 0.25)},
+         {QPalette::Dark, mixed(card, text, 0.35)},
+         {QPalette::Shadow, hex(0x000000)}});
     QPalette palette;
-    const auto button = mixed(card, text, isDark ? 0.1 : 0.03);
-    palette.setColor(QPalette::Window, card);
-    palette.setColor(QPalette::WindowText, text);
-    palette.setColor(QPalette::Base, field);
-    palette.setColor(QPalette::AlternateBase, card);
-    palette.setColor(QPalette::Text, text);
-    palette.setColor(QPalette::PlaceholderText, secondary);
-    palette.setColor(QPalette::Button, button);
-    palette.setColor(QPalette::ButtonText, text);
-    palette.setColor(QPalette::BrightText, text);
-    palette.setColor(QPalette::ToolTipBase, field);
-    palette.setColor(QPalette::ToolTipText, text);
-    palette.setColor(QPalette::Link, link);
-    palette.setColor(QPalette::LinkVisited, link);
-    palette.setColor(QPalette::Highlight, hex(isDark ? 0x3D6FB8 : 0x2F6FCF));
-    palette.setColor(QPalette::HighlightedText, hex(0xFFFFFF));
-    palette.setColor(QPalette::Light, mixed(card, hex(0xFFFFFF), isDark ? 0.1 : 0.8));
-    palette.setColor(QPalette::Midlight, mixed(card, hex(0xFFFFFF), isDark ? 0.06 : 0.5));
-    palette.setColor(QPalette::Mid, mixed(card, text, 0.25));
-    palette.setColor(QPalette::Dark, mixed(card, text, 0.35));
-    palette.setColor(QPalette::Shadow, hex(0x000000));
-    const auto faint = mixed(card, secondary, 0.55);
+    for (const auto& [role, color] : colors)
+        palette.setColor(role, color);
+    const auto faint = mixed(card, secondary, FaintPart);
     for (const auto role : {QPalette::WindowText, QPalette::Text, QPalette::ButtonText})
         palette.setColor(QPalette::Disabled, role, faint);
     return palette;
