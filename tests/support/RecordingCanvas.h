@@ -9,7 +9,8 @@
 namespace orvo::testing {
 
 /// Writes down what is drawn, one line each: what, its colour as `RRGGBB` or `RRGGBBAA`, and where,
-/// in points of the view that was drawn first.
+/// in points of the view that was drawn first. Of a stroke also the width, of round corners the
+/// radius.
 class RecordingCanvas final : public Canvas {
 public:
     explicit RecordingCanvas(double scale = 1)
@@ -26,8 +27,8 @@ public:
     }
     void clip(const CGRect& rect, double) override { write("clip", rect); }
     void fade(double alpha) override { drawn.push_back("fade " + number(alpha)); }
-    void fill(const CGRect& rect, double, RGBA color) override {
-        write("fill " + hex(color), rect);
+    void fill(const CGRect& rect, double radius, RGBA color) override {
+        write("fill " + hex(color) + (radius > 0 ? " radius " + number(radius) : ""), rect);
     }
     void stroke(const CGRect& rect, double, double width, RGBA color) override {
         write("stroke " + number(width) + " " + hex(color), rect);

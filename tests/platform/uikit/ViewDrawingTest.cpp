@@ -6,8 +6,8 @@
 #include "platform/uikit/UIImageDrawing.h"
 #include "platform/uikit/UIImageView.h"
 #include "platform/uikit/UIVisualEffectView.h"
-#include "platform/uikit/drawing/Canvas.h"
 #include "platform/uikit/drawing/FixedImagePainter.h"
+#include "support/RecordingCanvas.h"
 
 #include <algorithm>
 #include <cmath>
@@ -15,67 +15,12 @@
 namespace orvo {
 namespace {
 
-/// Writes down what is drawn, in the coordinates of the screen.
-class RecordingCanvas final : public Canvas {
-public:
-    std::vector<std::string> drawn;
-
-    double scale() const override { return 2; }
-    void save() override { _origins.push_back(_origins.back()); }
-    void restore() override { _origins.pop_back(); }
-    void translate(double x, double y) override {
-        _origins.back().x += x;
-        _origins.back().y += y;
-    }
-    void clip(const CGRect& rect, double) override { write("clip", rect); }
-    void fade(double alpha) override { drawn.push_back("fade " + number(alpha)); }
-    void fill(const CGRect& rect, double radius, RGBA color) override {
-        write("fill radius " + number(radius) + " " + hex(color), rect);
-    }
-    void stroke(const CGRect& rect, double, double, RGBA color) override {
-        write("stroke " + hex(color), rect);
-    }
-    void text(const TextLine& line, CGPoint baseline, RGBA color) override {
-        write("text " + line.text + " " + hex(color), {baseline, {line.width, 0}});
-    }
-    void pixels(std::span<const std::uint32_t>,
-                int columns,
-                int rows,
-                const CGRect& rect,
-                const RGBA* tint) override {
-        write("pixels " + std::to_string(columns) + "x" + std::to_string(rows) +
-                  (tint ? " " + hex(*tint) : ""),
-              rect);
-    }
-    void fixedImage(std::string_view name, const CGRect& rect, RGBA color) override {
-        write("image " + std::string(name) + " " + hex(color), rect);
-    }
-
-private:
-    static std::string number(double value) {
-        char text[32];
-        std::snprintf(text, sizeof text, "%g", value);
-        return text;
-    }
-    static std::string hex(RGBA color) {
-        char text[16];
-        std::snprintf(text, sizeof text, "%02X%02X%02X", color.red, color.green, color.blue);
-        return text;
-    }
-    void write(const std::string& what, const CGRect& rect) {
-        drawn.push_back(what + " at " + number(rect.origin.x + _origins.back().x) + " " +
-                        number(rect.origin.y + _origins.back().y) + " " + number(rect.size.width) +
-                        " " + number(rect.size.height));
-    }
-    std::vector<CGPoint> _origins{CGPoint()};
-};
-
 class DrawingTest : public testing::ViewTest {
 protected:
     using Lines = std::vector<std::string>;
     static Lines draw(const std::shared_ptr<UIView>& view) {
         view->layoutIfNeeded();
-        RecordingCanvas canvas;
+        testing::RecordingCanvas canvas(2);
         drawViewHierarchy(*view, canvas);
         return canvas.drawn;
     }
@@ -87,8 +32,9 @@ TEST_F(DrawingTest, BackgroundThenContentThenSubviewsInOrder) {
     card->setCornerRadius(14);
     const auto text = label(card, "text", "hello");
     place(text, 10, 20);
-    EXPECT_EQ(draw(card),
-              (Lines{"fill radius 14 F4F4F6 at 0 0 100 50", "text hello 17171A at 10 28 25 0"}));
+    EXPECT_EQ(
+        draw(card),
+        (Lines{"fill F4F4F6 radius 14 at 0 0 100 50", "text \"hello\" 17171A at 10 28 25 0"}));
 }
 
 TEST_F(DrawingTest, HiddenAndTransparentViewsAreLeftOut) {
@@ -102,7 +48,7 @@ TEST_F(DrawingTest, HiddenAndTransparentViewsAreLeftOut) {
     hidden->setHidden(true);
     clear->setAlpha(0);
     faint->setAlpha(0.5);
-    EXPECT_EQ(draw(card), (Lines{"fade 0.5", "text faint 17171A at 0 8 25 0"}));
+    EXPECT_EQ(draw(card), (Lines{"fade 0.5", "text \"faint\" 17171A at 0 8 25 0"}));
 }
 
 TEST_F(DrawingTest, ScrolledAndClippedContent) {
@@ -113,7 +59,7 @@ TEST_F(DrawingTest, ScrolledAndClippedContent) {
     text->setFrame({{0, 60}, {100, 10}});
     scroller->addSubview(text);
     scroller->setBounds({{0, 40}, {100, 50}});
-    EXPECT_EQ(draw(scroller), (Lines{"clip at 0 0 100 50", "text hello 17171A at 0 28 25 0"}));
+    EXPECT_EQ(draw(scroller), (Lines{"clip at 0 0 100 50", "text \"hello\" 17171A at 0 28 25 0"}));
 }
 
 TEST_F(DrawingTest, AlignmentFollowsTheDirectionOfReading) {
@@ -126,11 +72,11 @@ TEST_F(DrawingTest, AlignmentFollowsTheDirectionOfReading) {
         return draw(card).front();
     };
     using enum UIUserInterfaceLayoutDirection;
-    EXPECT_EQ(drawn(NSTextAlignment::Natural, LeftToRight), "text hello 17171A at 0 8 25 0");
-    EXPECT_EQ(drawn(NSTextAlignment::Natural, RightToLeft), "text hello 17171A at 75 8 25 0");
-    EXPECT_EQ(drawn(NSTextAlignment::Left, RightToLeft), "text hello 17171A at 0 8 25 0");
-    EXPECT_EQ(drawn(NSTextAlignment::Center, LeftToRight), "text hello 17171A at 37.5 8 25 0");
-    EXPECT_EQ(drawn(NSTextAlignment::Right, LeftToRight), "text hello 17171A at 75 8 25 0");
+    EXPECT_EQ(drawn(NSTextAlignment::Natural, LeftToRight), "text \"hello\" 17171A at 0 8 25 0");
+    EXPECT_EQ(drawn(NSTextAlignment::Natural, RightToLeft), "text \"hello\" 17171A at 75 8 25 0");
+    EXPECT_EQ(drawn(NSTextAlignment::Left, RightToLeft), "text \"hello\" 17171A at 0 8 25 0");
+    EXPECT_EQ(drawn(NSTextAlignment::Center, LeftToRight), "text \"hello\" 17171A at 37.5 8 25 0");
+    EXPECT_EQ(drawn(NSTextAlignment::Right, LeftToRight), "text \"hello\" 17171A at 75 8 25 0");
 }
 
 TEST_F(DrawingTest, VibrancyGivesTextsAndImagesItsColour) {
@@ -149,7 +95,7 @@ TEST_F(DrawingTest, VibrancyGivesTextsAndImagesItsColour) {
         "pixels");
     place(pixels, 50, 0);
     EXPECT_EQ(draw(effect),
-              (Lines{"text a 5B5B63 at 0 8 5 0",
+              (Lines{"text \"a\" 5B5B63 at 0 8 5 0",
                      "image good-v2 5B5B63 at 20 0 24 24",
                      "pixels 2x2 5B5B63 at 50 0 1 1"}));
 }
@@ -199,7 +145,7 @@ TEST_F(DrawingTest, VibrancyFadesToNothingAndFromTheWhole) {
         return draw(effect);
     };
     EXPECT_EQ(faded(0), Lines());
-    EXPECT_EQ(faded(1), Lines{"text a 5B5B63 at 0 8 5 0"});
+    EXPECT_EQ(faded(1), Lines{"text \"a\" 5B5B63 at 0 8 5 0"});
     double last = 0;
     for (const double alpha : {0.01, 0.2, 0.5, 0.9}) {
         const double shown = std::stod(faded(alpha).front().substr(std::string("fade ").size()));

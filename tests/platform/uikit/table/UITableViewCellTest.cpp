@@ -64,9 +64,9 @@ TEST_F(TableCellTest, GroundIsDarkerInLightAndLighterInTheDark) {
         drawViewHierarchy(*row, canvas);
         return canvas.drawn;
     };
-    EXPECT_EQ(ground(), (std::vector<std::string>{"fill 17171A14 at -8 0 116 10"}));
+    EXPECT_EQ(ground(), (std::vector<std::string>{"fill 17171A14 radius 8 at -8 0 116 10"}));
     row->setTraitCollection(UITraitCollection{.userInterfaceStyle = UIUserInterfaceStyle::Dark});
-    EXPECT_EQ(ground(), (std::vector<std::string>{"fill F5F5F714 at -8 0 116 10"}));
+    EXPECT_EQ(ground(), (std::vector<std::string>{"fill F5F5F714 radius 8 at -8 0 116 10"}));
 }
 
 TEST_F(TableCellTest, IsSpokenAsWhatItShowsFromTopToBottom) {

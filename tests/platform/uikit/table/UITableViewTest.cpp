@@ -216,12 +216,12 @@ TEST_F(TableTest, DeselectionFadesTheRowsGround) {
     source->deselects = true;
     draw();
     table->touchBegan({50, 5});
-    EXPECT_EQ(fills(draw()), (Strings{"fill 17171A14 at -8 0 116 10"}));
+    EXPECT_EQ(fills(draw()), (Strings{"fill 17171A14 radius 8 at -8 0 116 10"}));
     table->touchEnded({50, 5});
     EXPECT_EQ(table->indexPathForSelectedRow(), nullptr);
-    EXPECT_EQ(fills(draw()), (Strings{"fill 17171A14 at -8 0 116 10"}));
+    EXPECT_EQ(fills(draw()), (Strings{"fill 17171A14 radius 8 at -8 0 116 10"}));
     advance(0.125);
-    EXPECT_EQ(fills(draw()), (Strings{"fill 17171A0A at -8 0 116 10"}));
+    EXPECT_EQ(fills(draw()), (Strings{"fill 17171A0A radius 8 at -8 0 116 10"}));
     advance(0.125);
     EXPECT_TRUE(fills(draw()).empty());
 }
