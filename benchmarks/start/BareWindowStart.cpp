@@ -7,6 +7,9 @@
 #include <QPainter>
 #include <QRasterWindow>
 
+#include <fontconfig/fontconfig.h>
+#include <string_view>
+
 namespace {
 
 constexpr int Lines = 5;
@@ -34,7 +37,10 @@ private:
 
 } // namespace
 
-int main() {
+// With "own-fonts" it knows no fonts of the system, as the card while it needs none of them.
+int main(int argc, char** argv) {
+    if (argc > 1 && argv[1] == std::string_view("own-fonts"))
+        FcConfigSetCurrent(FcConfigCreate());
     orvo::makeDesktopApplication("com.zentu.Orvo.TransitWidget");
     BareWindow window;
     window.setFlags(Qt::Window | Qt::FramelessWindowHint);
