@@ -268,6 +268,17 @@ TEST_F(DynamicTypeWizardTest, AStacksSpacingIsScaledAtOnceAndAtEachChange) {
     EXPECT_EQ(stack->spacing(), 65); // 21 × 53 ÷ 17 = 65.5, less a rounding of the font's
 }
 
+TEST_F(DynamicTypeWizardTest, AStacksSpacingIsRoundedForTheStack) {
+    useSize(UIContentSizeCategory::L, 1);
+    const auto stack = UIStackView::init();
+    stack->setTraitCollection(UITraitCollection{.displayScale = 2});
+    Wizard::autoscaleStackView_spacing_withFontProvider(stack, 10.3, noFont);
+    EXPECT_EQ(stack->spacing(), 10.5);
+    stack->setSpacing(0);
+    changeSize();
+    EXPECT_EQ(stack->spacing(), 10.5);
+}
+
 TEST_F(DynamicTypeWizardTest, ASelectorIsPerformedAtEachChangeWhoeverSendsIt) {
     const auto object = performer();
     perform(object, "doIt", 1);

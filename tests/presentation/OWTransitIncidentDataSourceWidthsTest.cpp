@@ -68,6 +68,22 @@ TEST_F(DataSourceTest, WithACompactItemTheColumnIsTheCompactRows) {
     EXPECT_EQ(source->artworkColumnWidth(), 73);
 }
 
+TEST_F(DataSourceTest, TheColumnIsTheCompactRowsAlsoWhereExpandedOnesAreWider) {
+    cache->widths[{"wide", 7}] = 120;
+    for (const bool expanded : {false, true}) {
+        const auto source =
+            make(success(advisoriesWithShields({"wide", "narrow"})), {.expanded = expanded});
+        EXPECT_EQ(source->artworkColumnWidth(), 120);
+        const auto items = source->listItem()->expandedItems();
+        source->setListItem(
+            OWTransitListItem::initWithSummaryItem_expandedItems(items->objectAtIndex(1), items));
+        EXPECT_EQ(source->artworkColumnWidth(), 73);
+        source->setAvailableWidth(400);
+        EXPECT_EQ(source->artworkColumnWidth(), 73);
+        EXPECT_EQ(source->isExpanded(), expanded);
+    }
+}
+
 TEST_F(DataSourceTest, ASummaryOfSeveralIsLeftAsItIsAndTheColumnIsTheExpandedRows) {
     cache->widths[{"a", 7}] = 100;
     const auto source = make(success(advisoriesWithShields({"a", "b"})));

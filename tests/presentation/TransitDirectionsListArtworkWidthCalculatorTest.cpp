@@ -121,6 +121,21 @@ TEST_F(TransitDirectionsListArtworkWidthCalculatorTest, OfEquallyWideShieldsTheL
     EXPECT_EQ(shrinking(), (std::vector<std::string>{"b6", "a6", "b5"}));
 }
 
+TEST_F(TransitDirectionsListArtworkWidthCalculatorTest,
+       OfManyEquallyWideShieldsTheLastShrinksFirst) {
+    std::vector<Artwork> artworks;
+    std::vector<std::string> fromTheLast;
+    for (int number = 10; number < 40; ++number) {
+        const auto text = "s" + std::to_string(number);
+        cache->widths[{text, 7}] = 80;
+        cache->widths[{text, 6}] = 60;
+        artworks.push_back(artwork(text.c_str()));
+        fromTheLast.insert(fromTheLast.begin(), text + "6");
+    }
+    EXPECT_EQ(width(artworks, limits(20, 70)), 60);
+    EXPECT_EQ(shrinking(), fromTheLast);
+}
+
 TEST_F(TransitDirectionsListArtworkWidthCalculatorTest, ATooWideShieldShrinksSizeBySize) {
     const auto a = artwork("a"); // 70 points at size 7
     EXPECT_EQ(width({a}, limits(20, 45)), 40);
