@@ -99,6 +99,11 @@ TEST(EntityReader, DeletedEntitiesAreSkippedWhereverTheySaySo) {
     EXPECT_TRUE(Reading(AlertMaker().entity().number(2, 0)).reading.alert);
 }
 
+TEST(EntityReader, AnyNumberButZeroMeansDeleted) {
+    for (const std::uint64_t number : {2ULL, 256ULL, 1ULL << 32U, 1ULL << 63U, ~0ULL})
+        EXPECT_FALSE(Reading(AlertMaker().entity().number(2, number)).reading.alert) << number;
+}
+
 TEST(EntityReader, TripUpdatesAndVehiclesAreNoAlerts) {
     const Reading trip(Wire().bytes(1, "t").bytes(3, "whatever this is"));
     const Reading vehicle(Wire().bytes(1, "v").bytes(4, ""));
@@ -159,6 +164,23 @@ TEST(EntityReader, UnlistedAndBadNumbersLeaveTheDefault) {
     EXPECT_EQ(read.alert().effect, 8);
     EXPECT_EQ(read.alert().severity, 1);
     EXPECT_EQ(read.count(AlertCount::UnreadableNumbers), 3U);
+}
+
+TEST(EntityReader, ListedNumbersEndWithTheLastOfTheFormat) {
+    AlertMaker last = with(Wire().number(6, 12).number(14, 4));
+    last.effect = 11;
+    const Reading listed(last.entity());
+    EXPECT_EQ(listed.alert().cause, 12);
+    EXPECT_EQ(listed.alert().effect, 11);
+    EXPECT_EQ(listed.alert().severity, 4);
+    EXPECT_EQ(listed.count(AlertCount::UnreadableNumbers), 0U);
+    AlertMaker next = with(Wire().number(6, 13).number(14, 5));
+    next.effect = 12;
+    const Reading unlisted(next.entity());
+    EXPECT_EQ(unlisted.alert().cause, 1);
+    EXPECT_EQ(unlisted.alert().effect, 8);
+    EXPECT_EQ(unlisted.alert().severity, 1);
+    EXPECT_EQ(unlisted.count(AlertCount::UnreadableNumbers), 3U);
 }
 
 TEST(EntityReader, AnUnreadableSelectorLeavesTheOthersAndMayConcernAnyLine) {

@@ -174,6 +174,19 @@ TEST(IncidentBuilder, UnitedAlertsHaveTheWorstSeverityAndTheFirstToldCause) {
     EXPECT_EQ(details.cause, IncidentCause::Accident);
 }
 
+TEST(IncidentBuilder, UnitedAlertsWereUpdatedWhenTheLatestOfTheirMessagesWasMade) {
+    const auto made = [](double secondsAgo) {
+        return source(message(Alerts{maker()}, static_cast<std::uint64_t>(At - secondsAgo)));
+    };
+    for (const auto& sources :
+         {std::vector{made(20), made(300)}, std::vector{made(300), made(20)}}) {
+        const Answer result(sources, query());
+        ASSERT_EQ(result.incidents("R1").size(), 1U);
+        EXPECT_EQ(seconds(result.incidents("R1")[0]->lastUpdated()), At - 20);
+        EXPECT_EQ(seconds(result.incidents("R1")[0]->creationDate()), At - 20);
+    }
+}
+
 TEST(IncidentBuilder, ConcernedStopsAreTold) {
     const Answer result = answer({maker([](AlertMaker& m) {
         m.selectors = {route("R2").bytes(5, "S7"),

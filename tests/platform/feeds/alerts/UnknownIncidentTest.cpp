@@ -1,5 +1,6 @@
 #include "platform/feeds/alerts/UnknownIncident.h"
 
+#include "platform/foundation/Hashing.h"
 #include "platform/geoservices/TransitIncidentAffectedEntity.h"
 
 #include <gtest/gtest.h>
@@ -60,6 +61,15 @@ TEST(UnknownIncident, ItsNumberIsOfFeedAndLineAlone) {
     EXPECT_NE(unknown(failed)->muid(), unknown(failed, {"town", 8, "Metro", ""})->muid());
     EXPECT_NE(unknown(failed)->muid(), unknown(failed, {"city", 7, "Metro", ""})->muid());
     EXPECT_NE(unknown(failed)->muid(), 0U);
+}
+
+TEST(UnknownIncident, ItsNumberStaysForItIsThatOfFeedLineAndTheWordUnknown) {
+    const UnknownStatus failed{UnknownStatus::Reason::SourceFailed, Now, ""};
+    const std::string_view content("town\0"
+                                   "7\0"
+                                   "unknown",
+                                   14);
+    EXPECT_EQ(unknown(failed)->muid(), stableHash(content));
 }
 
 TEST(UnknownIncident, SaysWhy) {
