@@ -72,6 +72,19 @@ activityWithPayload(const char* type, const char* key, const std::shared_ptr<NSD
         type, NSDictionary::dictionaryWithTextKeys({{key, payload}}));
 }
 
+/// The line with all its incidents, packed.
+std::shared_ptr<NSData> payloadOfLine(const std::shared_ptr<TransitLineItem>& line) {
+    OrvoActivity activity;
+    activity.setLineItem(TransitStorageLineItem::initWithLineItem(line));
+    activity.setDisplayOptions(std::make_shared<URLOptions>());
+    activity.displayOptions()->setMapType(TransitMapType);
+    return NSDataOrvoExtra::bzip2CompressedData(*activity.data());
+}
+
+std::shared_ptr<OWUserActivityData> lineActivity(const std::shared_ptr<NSData>& payload) {
+    return activityWithPayload("com.zentu.Orvo.Transit.Incident", "bs", payload);
+}
+
 } // namespace
 
 std::shared_ptr<OWTransitIncidentsDataSourceBuilder>
@@ -174,7 +187,16 @@ std::shared_ptr<OWTransitItem> OWTransitIncidentsDataSourceBuilder::_itemForInci
         std::move(secondaryText),
         sizedArtwork(artworkOfLine(*line)),
         false,
-        _userActivityDataForLineItem(line));
+        activityOfLine(line));
+}
+
+std::shared_ptr<OWUserActivityData> OWTransitIncidentsDataSourceBuilder::activityOfLine(
+    const std::shared_ptr<TransitLineItem>& line) const {
+    if (_packedLine != line) {
+        _payloadOfPackedLine = payloadOfLine(line);
+        _packedLine = line;
+    }
+    return lineActivity(_payloadOfPackedLine);
 }
 
 std::shared_ptr<OWConfiguredArtwork> OWTransitIncidentsDataSourceBuilder::sizedArtwork(
@@ -188,13 +210,7 @@ std::shared_ptr<OWConfiguredArtwork> OWTransitIncidentsDataSourceBuilder::sizedA
 std::shared_ptr<OWUserActivityData>
 OWTransitIncidentsDataSourceBuilder::_userActivityDataForLineItem(
     const std::shared_ptr<TransitLineItem>& line) {
-    OrvoActivity activity;
-    activity.setLineItem(TransitStorageLineItem::initWithLineItem(line));
-    activity.setDisplayOptions(std::make_shared<URLOptions>());
-    activity.displayOptions()->setMapType(TransitMapType);
-    return activityWithPayload("com.zentu.Orvo.Transit.Incident",
-                               "bs",
-                               NSDataOrvoExtra::bzip2CompressedData(*activity.data()));
+    return lineActivity(payloadOfLine(line));
 }
 
 std::shared_ptr<OWUserActivityData> OWTransitIncidentsDataSourceBuilder::_activityDataForIncidents(

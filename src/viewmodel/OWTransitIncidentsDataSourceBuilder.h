@@ -1,6 +1,7 @@
 #pragma once
 
 #include "handoff/OWUserActivityData.h"
+#include "platform/foundation/NSData.h"
 #include "platform/foundation/NSURL.h"
 #include "platform/geoservices/TransitIncident.h"
 #include "platform/geoservices/TransitLineItem.h"
@@ -86,6 +87,10 @@ private:
     [[nodiscard]] std::shared_ptr<OWTransitListItem>
     shapedListItem(_OWDisplayedIncidents& displayed) const;
     void cutOverflow(Rows& rows, const _OWDisplayedIncidents& displayed) const;
+    /// As `_userActivityDataForLineItem`. What the rows of a line hand over is packed once for all
+    /// of them: it holds every incident of the line, and a feed can have thousands.
+    [[nodiscard]] std::shared_ptr<OWUserActivityData>
+    activityOfLine(const std::shared_ptr<TransitLineItem>& line) const;
     [[nodiscard]] std::shared_ptr<OWConfiguredArtwork>
     sizedArtwork(const std::shared_ptr<TransitArtworkDataSource>& artwork) const;
     [[nodiscard]] std::shared_ptr<OWConfiguredArtwork>
@@ -97,6 +102,8 @@ private:
     std::shared_ptr<OWTransitIncidentsAnalyticsDelegate> _analytics;
     std::shared_ptr<OWTransitIncidentFilter> _incidentFilter;
     std::shared_ptr<OWTransitListItem> _listItem;
+    mutable std::shared_ptr<TransitLineItem> _packedLine;
+    mutable std::shared_ptr<NSData> _payloadOfPackedLine;
 };
 
 } // namespace orvo

@@ -428,6 +428,19 @@ TEST_F(BuilderTest, RestoredLineItemIsTheSourceOfThePayload) {
     EXPECT_EQ(muidsOfList(summary(list)->userActivityData()), (std::vector<std::uint64_t>{70, 71}));
 }
 
+TEST_F(BuilderTest, WhatTheRowsOfALineHandOverIsPackedOnce) {
+    int packed = 0;
+    const auto scope = Bzip2Compressor().overrideWith(
+        [&](const std::uint8_t*, std::size_t, std::uint8_t**, std::size_t*) {
+            ++packed;
+            return false;
+        });
+    const auto list = world.list({line(1, {incident(11), incident(12), incident(13)}),
+                                  line(2, {incident(21), incident(22)})});
+    EXPECT_EQ(rows(list).size(), 5U);
+    EXPECT_EQ(packed, 2);
+}
+
 TEST_F(BuilderTest, FailedCompressionLeavesTheRowWithoutAnOpenable) {
     const auto scope = Bzip2Compressor().overrideWith(
         [](const std::uint8_t*, std::size_t, std::uint8_t**, std::size_t*) { return false; });
