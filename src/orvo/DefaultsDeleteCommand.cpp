@@ -18,7 +18,10 @@ CommandSpec DefaultsDeleteCommand::spec() const {
 ExitCode DefaultsDeleteCommand::run(const Arguments& arguments, CommandContext& context) {
     const std::string& key = arguments.operands()[0];
     const auto defaults = OrvoGroup::__orvo_groupUserDefaults();
-    if (!defaults->objectForKey(key))
+    const auto value = defaults->objectForKey(key);
+    if (const auto error = defaults->unreadable())
+        return context.fail(*error);
+    if (!value)
         return context.fail(fmt::format("{} is not set", key), "See: orvo defaults read");
     const auto error = defaults->removeObjectForKey(key);
     return error ? context.fail(*error) : ExitCode::Answered;

@@ -44,11 +44,15 @@ ExitCode DefaultsReadCommand::run(const Arguments& arguments, CommandContext& co
     Values values;
     if (key) {
         const auto value = defaults->objectForKey(*key);
+        if (const auto error = defaults->unreadable())
+            return context.fail(*error);
         if (!value)
             return context.fail(fmt::format("{} is not set", *key), "See: orvo defaults read");
         values[*key] = value;
     } else {
         const auto all = defaults->dictionaryRepresentation();
+        if (const auto error = defaults->unreadable())
+            return context.fail(*error);
         for (const auto& [name, value] : all->entries()) {
             if (const auto text = stringValue(name.get()))
                 values[*text] = value;

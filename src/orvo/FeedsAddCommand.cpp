@@ -108,7 +108,12 @@ ExitCode FeedsAddCommand::run(const Arguments& arguments, CommandContext& contex
     if (const auto problem = feed.problem())
         return context.wrongUsage(problem->localizedDescription());
     auto& registry = *context.registry();
-    const bool exists = registry.feed(feed.name).has_value();
+    std::shared_ptr<NSError> unread;
+    const bool exists = registry.feed(feed.name, &unread).has_value();
+    // A damaged file is set aside when the feed is added. One that is only hidden may have a feed
+    // of that name, whose schedule must stay.
+    if (unread && unread->domain() != FeedErrorDomain)
+        return context.fail(*unread);
     if (exists && !arguments.has("replace"))
         return context.fail(fmt::format("there is a feed {} already", feed.name),
                             "Choose another name, or say --replace.");
@@ -135,12 +140,16 @@ void FeedsAddCommand::tryAlerts(const FeedConfiguration& feed, CommandContext& c
     const auto answer = FeedInspection::of({feed}, context);
     for (const auto& statistics : answer.feeds) {
         for (std::size_t i = 0; i < statistics.sources.size(); ++i) {
-            if (const auto& error = statistics.sources[i].error)
-                context.terminal().warning(
-                    fmt::format("the alerts {} cannot be read now: {}",
-                                feed.alerts[i].displayLocation(),
-                                feed.alerts[i].withoutSecrets(error->localizedDescription())),
-                    fmt::format("Try again later with: orvo feeds check {}", feed.name));
+            const auto& error = statistics.sources[i].error;
+            if (!error)
+                continue;
+            const auto location = feed.alerts[i].displayLocation();
+            auto reason = feed.alerts[i].withoutSecrets(error->localizedDescription());
+            if (reason.starts_with(location + ": ")) // once is enough
+                reason.erase(0, location.size() + 2);
+            context.terminal().warning(
+                fmt::format("the alerts {} cannot be read now: {}", location, reason),
+                fmt::format("Try again later with: orvo feeds check {}", feed.name));
         }
     }
 }

@@ -36,7 +36,20 @@ Infos infosOf(const std::vector<FeedConfiguration>& feeds,
     return Infos(feeds.size());
 }
 
-std::string json(const FeedChoice& choice, const Infos& infos, double now) {
+/// Null for nothing.
+template <class T>
+void add(JsonWriter& json, const char* key, const std::optional<T>& value) {
+    json.key(key);
+    if (value)
+        json.value(*value);
+    else
+        json.null();
+}
+
+/// What is not known is null, never 0 or false. `areKnown`: whether the schedules could be read; a
+/// feed without one has no lines then.
+std::string json(const FeedChoice& choice, const Infos& infos, bool areKnown, double now) {
+    const auto none = areKnown ? std::optional<std::int64_t>(0) : std::nullopt;
     JsonWriter json;
     json.beginObject().key("feeds").beginArray();
     for (std::size_t place = 0; place < choice.feeds.size(); ++place) {
@@ -44,12 +57,12 @@ std::string json(const FeedChoice& choice, const Infos& infos, double now) {
         const auto& info = infos[place];
         json.beginObject();
         json.key("name").value(feed.name);
-        json.key("lines").value(info ? info->lines : 0);
-        json.key("agencies").value(info ? info->agencies : 0);
+        add(json, "lines", info ? info->lines : none);
+        add(json, "agencies", info ? info->agencies : none);
         json.key("version").value(textOrNull(info, &ScheduleInfo::version));
         json.key("start_date").value(textOrNull(info, &ScheduleInfo::startDate));
         json.key("end_date").value(textOrNull(info, &ScheduleInfo::endDate));
-        json.key("run_out").value(info && info->hasRunOut(now));
+        add(json, "run_out", areKnown ? std::optional(info && info->hasRunOut(now)) : std::nullopt);
         JsonParts::addTime(json, "imported", info ? std::optional(info->importedAt) : std::nullopt);
         JsonParts::addTime(json, "checked", feed.lastScheduleCheck);
         json.key("static").value(feed.schedule.displayLocation());
@@ -96,7 +109,7 @@ ExitCode FeedsListCommand::run(const Arguments& arguments, CommandContext& conte
         choice.error = unread;
     const double now = context.now();
     if (arguments.has("json"))
-        context.terminal().output() << json(choice, infos, now);
+        context.terminal().output() << json(choice, infos, !unread, now);
     if (choice.error)
         return context.fail(*choice.error);
     if (arguments.has("json"))

@@ -28,8 +28,9 @@ ExitCode FeedsRemoveCommand::run(const Arguments& arguments, CommandContext& con
     if (!schedules)
         return context.fail(*error);
     for (const auto& feed : choice.feeds) {
-        if ((error = context.registry()->remove(feed.name)) ||
-            (error = schedules->removeSchedule(feed.name)))
+        // The schedule first: it is what another program may hold, and then all is as it was.
+        if ((error = schedules->removeSchedule(feed.name)) ||
+            (error = context.registry()->remove(feed.name)))
             return context.fail(*error);
         context.terminal().output() << fmt::format("Removed {}\n", feed.name);
     }

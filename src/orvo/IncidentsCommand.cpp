@@ -4,6 +4,7 @@
 #include "orvo/IncidentReportPrinter.h"
 #include "orvo/UnknownLines.h"
 #include "platform/feeds/ScheduleUpdater.h"
+#include "platform/feeds/TravelPreferences.h"
 #include "platform/feeds/schedule/LineMaker.h"
 #include "platform/foundation/DispatchQueue.h"
 #include "platform/foundation/Environment.h"
@@ -44,6 +45,9 @@ ExitCode IncidentsCommand::run(const Arguments& arguments, CommandContext& conte
         context.terminal().output() << report.json();
     if (report.error)
         return context.fail(*report.error);
+    if (const auto error = TravelPreferences::unreadable())
+        context.terminal().warning("your settings count as never made: " +
+                                   error->localizedDescription());
     if (arguments.has("json")) {
         UnknownLines::warn(report, context);
         lookForNewerSchedules(context);

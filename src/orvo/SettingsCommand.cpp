@@ -44,6 +44,8 @@ ExitCode SettingsCommand::run(const Arguments& arguments, CommandContext& contex
         return error ? context.fail(*error) : ExitCode::Answered;
     }
     const bool stepFree = TravelPreferences::asksForStepFree();
+    if (const auto error = TravelPreferences::unreadable())
+        return context.fail(*error);
     auto& output = context.terminal().output();
     if (arguments.has("json")) {
         JsonWriter json;

@@ -96,6 +96,18 @@ TEST_F(FavoritesCommandsTest, ADamagedFileIsToldAndIsNotLikeNone) {
     EXPECT_EQ(answered({"favorites", "list"}), "");
 }
 
+TEST_F(FavoritesCommandsTest, FavouritesThatAreHiddenAreNotLikeNone) {
+    const auto path = profile.path() / "data" / "favorites.sqlite";
+    std::filesystem::create_directories(path.parent_path());
+    std::filesystem::create_symlink(path.filename(), path); // a loop, which root cannot read either
+    for (const auto& words : std::vector<std::vector<std::string>>{
+             {"favorites", "list"}, {"incidents"}, {"incidents", "--json"}}) {
+        const auto error = refused(words);
+        EXPECT_THAT(error, HasSubstr("favorites.sqlite: the favorites cannot be opened: "));
+        EXPECT_THAT(error, HasSubstr("Too many levels of symbolic links\nMake it readable"));
+    }
+}
+
 TEST_F(FavoritesCommandsTest, ADamagedFileThatStaysIsAFailureWithTheCure) {
     write("data/favorites.sqlite", "no database at all, though long enough for a header of one");
     const auto error = refused({"favorites", "list", "--at", "2024-07-24T01:28:40Z"});

@@ -99,6 +99,48 @@ TEST_F(FeedsCommandsTest, SchedulesThatCannotBeReadAreToldAndAreNotLikeNone) {
     const auto json = run({"feeds", "list", "--json"});
     EXPECT_EQ(json.code, ExitCode::Failed);
     EXPECT_THAT(json.output, HasSubstr(store.string() + ": "));
+    EXPECT_THAT(json.output, HasSubstr("\"lines\": null,\n      \"agencies\": null,"));
+    EXPECT_THAT(json.output, HasSubstr("\"run_out\": null,"));
+}
+
+TEST_F(FeedsCommandsTest, AFeedWithoutAScheduleHasNoLinesInJson) {
+    addCity();
+    std::filesystem::remove(ScheduleStore::defaultPath());
+    const auto json = answered({"feeds", "list", "--json"});
+    EXPECT_THAT(json, HasSubstr("\"lines\": 0,\n      \"agencies\": 0,"));
+    EXPECT_THAT(json, HasSubstr("\"run_out\": false,"));
+    EXPECT_THAT(json, HasSubstr("\"imported\": null,"));
+}
+
+TEST_F(FeedsCommandsTest, AFeedWhoseScheduleCannotBeRemovedStays) {
+    addCity();
+    const auto store = ScheduleStore::defaultPath();
+    ASSERT_TRUE(SQLiteDatabase::open(store, SQLiteDatabase::Mode::Write, nullptr)
+                    ->execute("DROP TABLE line"));
+    EXPECT_THAT(refused({"feeds", "remove", "city"}), HasSubstr(store.string() + ": "));
+    EXPECT_THAT(answered({"feeds", "list"}), HasSubstr("city\t13\t"));
+}
+
+TEST_F(FeedsCommandsTest, AFeedWhoseNameMayBeTakenKeepsItsSchedule) {
+    addCity();
+    const auto registry = profile.path() / "data" / "feeds.plist";
+    std::filesystem::rename(registry, registry.string() + ".away");
+    std::filesystem::create_symlink("feeds.plist",
+                                    registry); // a loop, which root cannot read either
+    const auto other =
+        write("other/routes.txt", "route_id,agency_id,route_short_name,route_type\nX,mbt,X,1\n");
+    write("other/agency.txt",
+          "agency_id,agency_name,agency_url,agency_timezone\nmbt,M,https://m.example,UTC\n");
+    EXPECT_EQ(refused({"feeds",
+                       "add",
+                       "city",
+                       "--static",
+                       std::filesystem::path(other).parent_path().string(),
+                       "--alerts",
+                       "a.pb"}),
+              "orvo: " + registry.string() + ": Too many levels of symbolic links\n");
+    std::filesystem::rename(registry.string() + ".away", registry);
+    EXPECT_THAT(answered({"feeds", "list"}), HasSubstr("city\t13\t"));
 }
 
 TEST_F(FeedsCommandsTest, UpdateSaysWhatCameAndWent) {

@@ -57,6 +57,39 @@ TEST_F(SettingsCommandsTest, DamagedSettingsThatAreSetAsideAreToldOnce) {
     EXPECT_EQ(answered({"settings"}), "step-free\toff\n");
 }
 
+TEST_F(SettingsCommandsTest, SettingsThatCannotBeReadAreNotLikeNone) {
+    addCity(DemoIncidents::around(Now));
+    answered({"favorites", "add", "M1"});
+    const auto path = profile.path() / "data" / "group.com.zentu.Orvo.plist";
+    std::filesystem::create_symlink(path.filename(), path); // a loop, which root cannot read either
+    const auto reason = path.string() + ": Too many levels of symbolic links\n";
+    for (const auto& words : std::vector<std::vector<std::string>>{{"settings"},
+                                                                   {"settings", "--json"},
+                                                                   {"settings", "step-free"},
+                                                                   {"settings", "step-free", "on"},
+                                                                   {"defaults", "read"},
+                                                                   {"defaults", "read", "k"},
+                                                                   {"defaults", "write", "k", "v"},
+                                                                   {"defaults", "delete", "k"}}) {
+        const auto answer = run(words);
+        EXPECT_EQ(answer.code, ExitCode::Failed) << words.back();
+        EXPECT_EQ(answer.output, "");
+        EXPECT_EQ(answer.error, "orvo: " + reason);
+    }
+    const auto answer = run({"incidents"});
+    EXPECT_EQ(answer.code, ExitCode::Answered);
+    EXPECT_THAT(answer.error,
+                HasSubstr("orvo: warning: your settings count as never made: " + reason));
+    EXPECT_TRUE(std::filesystem::is_symlink(path));
+}
+
+TEST_F(SettingsCommandsTest, DamagedSettingsThatStayAreToldToo) {
+    const auto path = write("data/group.com.zentu.Orvo.plist", "no property list");
+    const auto error = refused({"settings", "--at", "2024-07-24T01:28:40Z"});
+    EXPECT_THAT(error, HasSubstr(path + " is damaged: property list, byte 0: "));
+    EXPECT_TRUE(std::filesystem::exists(path));
+}
+
 TEST_F(SettingsCommandsTest, ValuesAreOfTheKindThatTheyLookLikeOrThatIsAsked) {
     const auto kept = [&](std::vector<std::string> words) {
         words.insert(words.begin(), {"defaults", "write", "k"});

@@ -75,13 +75,15 @@ class ProgramTest(unittest.TestCase):
         path.write_bytes(content)
         return path
 
-    def run_without_rights(self, *words):
-        """Runs it where it may read the home folder and write nowhere in it."""
+    def run_without_rights(self, *words, hidden=()):
+        """Runs it where it may read the home folder, but for what is hidden, and write nowhere in it."""
         root = os.geteuid() == 0
         changed = []
         for path in [self.home, *self.home.rglob("*")]:
             changed.append((path, path.stat().st_mode))
             path.chmod(0o555 if path.is_dir() else 0o444)
+        for path in hidden:
+            path.chmod(0)
         nobody = {"user": 65534, "group": 65534, "extra_groups": []} if root else {}
         try:
             return Answer(subprocess.run(self.command(*words), env=self.environment, cwd="/", capture_output=True,

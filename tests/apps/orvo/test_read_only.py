@@ -46,6 +46,33 @@ class ReadOnly(ProgramTest):
             self.assertRegex(answer.err, str(self.home) + r"\S*: .*([Pp]ermission|readonly)", words)
         self.assertEqual(self.files(), before)
 
+    def test_what_is_hidden_is_not_like_none(self):
+        self.city()
+        self.orvo("settings", "step-free", "on")
+        data = self.home / "data" / "group.com.zentu.Orvo"
+        reading = {
+            "favorites.sqlite": (["favorites", "list"], ["incidents"], ["incidents", "--json"],
+                                 ["favorites", "list", "--at", "2025-06-15T12:00:00Z"]),
+            "schedules.sqlite": (["lines", "ferry"], ["feeds", "list"], ["incidents", "--all"],
+                                 ["lines", "ferry", "--at", "2025-06-15T12:00:00Z"]),
+            "group.com.zentu.Orvo.plist": (["settings"], ["defaults", "read"], ["defaults", "delete", "k"]),
+            "feeds.plist": (["feeds", "list"], ["incidents"], ["feeds", "remove", "city"]),
+        }
+        for name, commands in reading.items():
+            for hidden in (data / name, data):
+                for words in commands:
+                    answer = self.run_without_rights(*words, hidden=[hidden])
+                    self.assertEqual(answer.code, 1, f"{words} without {hidden}: {answer.out}")
+                    self.assertRegex(answer.err, str(data) + r"\S*: .*Permission denied", words)
+
+    def test_a_line_of_json_tells_what_is_hidden(self):
+        self.city()
+        store = self.home / "data" / "group.com.zentu.Orvo" / "schedules.sqlite"
+        feeds = self.run_without_rights("feeds", "list", "--json", hidden=[store]).json
+        (city,) = feeds["feeds"]
+        self.assertEqual((city["name"], city["lines"], city["agencies"], city["run_out"]), ("city", None, None, None))
+        self.assertIn("Permission denied", feeds["error"]["message"])
+
     def test_an_empty_home_is_one_without_favourites(self):
         self.assertIn("orvo favorites add", self.run_without_rights("incidents").err)
         self.assertIn("orvo feeds add", self.run_without_rights("feeds", "list").err)
