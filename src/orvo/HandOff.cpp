@@ -58,9 +58,11 @@ std::optional<HandOff::Content> lineOf(const NSData& payload, std::shared_ptr<NS
     const auto activity = protoMessageWithBytes<OrvoActivity>(message->bytes());
     if (!activity)
         return refuse(error, "The activity's content is no message that the widget writes.");
-    if (!activity->lineItem())
+    // A record without anything known in it would be shown as a line with good service.
+    const auto& line = activity->lineItem();
+    if (!line || (line->muid() == 0 && line->name().value_or("").empty()))
         return refuse(error, "The activity names no line.");
-    return HandOff::Line{activity->lineItem()};
+    return HandOff::Line{line};
 }
 
 std::optional<HandOff::Content> incidentsOf(const std::shared_ptr<NSData>& payload,

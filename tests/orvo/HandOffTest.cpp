@@ -124,6 +124,10 @@ TEST_F(HandOffTest, SaysWhatIsWrong) {
               std::string::npos);
     EXPECT_NE(refusal(lineActivity(*NSData::dataWithString(""))).find("no line"),
               std::string::npos);
+    // A line in which nothing is known is no line with good service.
+    for (const auto& unknown : {std::string("\x7A\0", 2), std::string("\x7A\2\x7A\0", 4)})
+        EXPECT_NE(refusal(lineActivity(*NSData::dataWithString(unknown))).find("no line"),
+                  std::string::npos);
     EXPECT_NE(refusal(testing::travelling(
                           IncidentsActivity, "incidentListKey", NSData::dataWithString("x")))
                   .find("no archive"),
