@@ -1,5 +1,6 @@
 #include "print/WidgetProgram.h"
 
+#include "fetching/FavoritesContainer_OWFavorites.h"
 #include "platform/extension/HeadlessApplication.h"
 #include "platform/extension/WidgetHost.h"
 #include "platform/feeds/ScheduleUpdater.h"
@@ -68,9 +69,19 @@ ExitCode WidgetProgram::run(const std::vector<std::string>& words) {
     makeHeadlessApplication();
     if (!applyEnvironment(options))
         return ExitCode::Failed;
-    if (options.draws())
-        return draw(options);
-    return options.open ? open(options) : print(options);
+    const auto code = options.draws() ? draw(options)
+                      : options.open  ? open(options)
+                                      : print(options);
+    return tellUnreadableFavorites() ? ExitCode::Failed : code;
+}
+
+bool WidgetProgram::tellUnreadableFavorites() {
+    const auto error = OWFavorites::defaultContainer()->unreadable();
+    auto message = error ? error->localizedDescription() : std::string();
+    if (!message.empty() && message != _saidOfFavorites)
+        _terminal.error(message);
+    _saidOfFavorites = std::move(message);
+    return error != nullptr;
 }
 
 bool WidgetProgram::applyEnvironment(const WidgetOptions& options) {
@@ -223,6 +234,7 @@ ExitCode WidgetProgram::follow(const WidgetOptions& options) {
         FollowRefreshInterval,
         [this] { renewDemonstration(); },
         [&](const PrintedWidget& widget) {
+            tellUnreadableFavorites();
             auto text = printer->text(widget);
             if (text == last)
                 return;

@@ -70,6 +70,9 @@ private:
     [[nodiscard]] ExitCode draw(const WidgetOptions& options) const;
     [[nodiscard]] ExitCode fail(const std::string& reason) const;
 
+    /// Favourites that cannot be read have no row of their own and look like none: says so, once
+    /// for each reason. Whether there was one.
+    bool tellUnreadableFavorites();
     /// Before each update that follows: the demonstration goes on when its hour is over. What fails
     /// is said once.
     void renewDemonstration();
@@ -85,6 +88,7 @@ private:
     std::optional<EnvironmentSlot<bool>::Override> _keepsWritesInMemory;
     std::optional<EnvironmentSlot<std::string>::Override> _language;
     std::optional<EnvironmentSlot<UITraitCollection>::Override> _traits;
+    std::string _saidOfFavorites;
     std::string _saidOfDemonstration;
     std::unique_ptr<DemoVisit> _demonstration; ///< nil on the person's own profile
     std::shared_ptr<NSTimer> _endOfDemonstration;

@@ -48,6 +48,21 @@ TEST_F(WidgetProgramTest, AFailedLookupIsARowAndAnswered) {
     EXPECT_NE(output.str().find("unavailable"), std::string::npos);
 }
 
+TEST_F(WidgetProgramTest, FavoritesThatCannotBeReadAreToldBesideTheRow) {
+    const auto file = FavoritesStore::standardPath();
+    std::filesystem::remove(file);
+    std::filesystem::create_symlink(file.filename(), file); // a loop, which root cannot read either
+    answerWith({}); // of an earlier test's favourites, which the container still knows
+    EXPECT_EQ(run({}), Exit::Failed);
+    EXPECT_EQ(error.str(),
+              "orvo-transit-widget: " + file.string() +
+                  ": the favorites cannot be opened: Too many levels of symbolic links\n");
+    EXPECT_NE(output.str(), "");
+    std::filesystem::remove(file);
+    EXPECT_EQ(run({}), Exit::Answered);
+    EXPECT_EQ(error.str(), "");
+}
+
 TEST_F(WidgetProgramTest, PrintingKeepsWritesInMemoryAndPutsTheEnvironmentBack) {
     bool keptInMemory = false;
     double now = 0;
