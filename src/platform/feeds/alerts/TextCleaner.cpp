@@ -122,7 +122,18 @@ bool isPlain(std::string_view text) {
     return true;
 }
 
+/// The text up to the most that is looked at, which ends with a whole character.
+std::string_view begun(std::string_view text) {
+    if (text.size() <= TextCleaner::LongestPublished)
+        return text;
+    const auto* const bytes = reinterpret_cast<const std::uint8_t*>(text.data());
+    auto end = static_cast<std::int32_t>(TextCleaner::LongestPublished);
+    U8_SET_CP_START(bytes, 0, end);
+    return text.substr(0, static_cast<std::size_t>(end));
+}
+
 std::string_view trimmed(std::string_view text) {
+    text = begun(text);
     constexpr std::string_view Blanks = " \t\r\n";
     text.remove_prefix(std::min(text.find_first_not_of(Blanks), text.size()));
     return text.substr(0, text.find_last_not_of(Blanks) + 1);

@@ -12,6 +12,9 @@ namespace TextCleaner {
 /// The most characters of a title, and of any other text.
 inline constexpr std::size_t LongestTitle = 200;
 inline constexpr std::size_t LongestText = 20'000;
+/// The most bytes of a published text that are looked at: room for a lot of markup around what can
+/// be shown. Megabytes of text are a mistake or malice, and would keep all others waiting.
+inline constexpr std::size_t LongestPublished = std::size_t{1} << 20U;
 
 /// Plain text: tags stripped, character references decoded (twice where they were escaped twice),
 /// control characters and those that override the direction of writing dropped. Line breaks stay,

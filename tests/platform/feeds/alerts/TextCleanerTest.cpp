@@ -125,6 +125,15 @@ TEST(TextCleaner, ATextInWhichNothingCanBeSeenIsEmpty) {
     EXPECT_EQ(clean("a\u200Bb"), "a\u200Bb"); // where a long word may break
 }
 
+TEST(TextCleaner, WhatLiesBeyondAMebibyteIsNotLookedAt) {
+    const std::string most(TextCleaner::LongestPublished, 'a');
+    EXPECT_EQ(clean(most + "b"), most);
+    EXPECT_EQ(TextCleaner::cleanLine(most + "b"), most);
+    const std::string longer = most.substr(1) + "é"; // the cut would be in the middle of it
+    EXPECT_EQ(clean(longer), most.substr(1));
+    EXPECT_EQ(clean("<b>" + most + "</b>"), most.substr(3));
+}
+
 TEST(TextCleaner, NoBlankStandsAtTheCut) {
     EXPECT_EQ(TextCleaner::capped("one two three", 4), "one");
 }
