@@ -64,7 +64,8 @@ bool isCertainlyMissing(const std::filesystem::path& path) {
 std::unique_ptr<SQLiteDatabase> openWithoutWriting(const std::filesystem::path& path,
                                                    std::shared_ptr<NSError>& failure) {
     std::shared_ptr<NSError> unread;
-    auto database = ScheduleTables::openForReading(path, unread);
+    constexpr std::chrono::seconds Short(1); // who wanted to write has waited already
+    auto database = ScheduleTables::openForReading(path, Short, unread);
     if (!database && !unread && isCertainlyMissing(path))
         database = ScheduleTables::openInMemory(std::nullopt, unread);
     if (database)
@@ -166,7 +167,7 @@ std::shared_ptr<ScheduleStore> ScheduleStore::open(const std::filesystem::path& 
         if (!database)
             database = openWithoutWriting(path, failure);
     } else {
-        database = ScheduleTables::openForReading(path, failure);
+        database = ScheduleTables::openForReading(path, ReaderPatience, failure);
         implementation->isInMemory = !database && !failure;
         if (implementation->isInMemory)
             database = ScheduleTables::openInMemory(std::nullopt, failure);

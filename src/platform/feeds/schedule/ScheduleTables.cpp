@@ -146,6 +146,7 @@ std::unique_ptr<SQLiteDatabase> openForWriting(const std::filesystem::path& path
 }
 
 std::unique_ptr<SQLiteDatabase> openForReading(const std::filesystem::path& path,
+                                               std::chrono::seconds patience,
                                                std::shared_ptr<NSError>& error) {
     std::error_code unknown;
     if (!std::filesystem::exists(path, unknown)) {
@@ -155,7 +156,7 @@ std::unique_ptr<SQLiteDatabase> openForReading(const std::filesystem::path& path
         return nullptr;
     }
     SQLiteFailure failure;
-    auto database = SQLiteDatabase::open(path, SQLiteDatabase::Mode::Read, &failure);
+    auto database = SQLiteDatabase::open(path, SQLiteDatabase::Mode::Read, &failure, patience);
     if (!database) {
         error = failureOf(failure, path);
         return nullptr;

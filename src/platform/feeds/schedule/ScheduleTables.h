@@ -24,9 +24,10 @@ namespace ScheduleTables {
                                                              std::chrono::seconds patience,
                                                              std::shared_ptr<NSError>& error);
 
-/// Opens the file for reading only.
+/// Opens the file for reading only. Waits up to `patience` for who holds it exclusively.
 /// @return nil without an error when there is no file, or one that has no tables yet
 [[nodiscard]] std::unique_ptr<SQLiteDatabase> openForReading(const std::filesystem::path& path,
+                                                             std::chrono::seconds patience,
                                                              std::shared_ptr<NSError>& error);
 
 /// An empty store in memory, or a copy of the file's.
