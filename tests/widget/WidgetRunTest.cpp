@@ -134,11 +134,7 @@ private:
             PlugInKitProxy::pluginKitProxyForIdentifier_containingBundle(
                 "a.widget", ApplicationProxy::applicationProxyForIdentifier("a.map")));
     EnvironmentSlot<std::shared_ptr<const CodingClassTable>>::Override _classes =
-        CodingClassTable::current().overrideWith(std::make_shared<const CodingClassTable>(
-            CodingClassTable{CodingClass::of<OWTransitIncidentViewControllerState>(
-                                 "OWTransitIncidentViewControllerState"),
-                             CodingClass::of<TransitStorageLineItem>("TransitStorageLineItem"),
-                             CodingClass::of<TransitStorageIncident>("TransitStorageIncident")}));
+        CodingClassTable::current().overrideWith(testing::savedClasses());
 };
 
 TEST_F(WidgetRun, FromWhatWasSavedToATapAndBack) {

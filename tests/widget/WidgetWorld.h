@@ -181,6 +181,15 @@ public:
     bool hasCompletion = true;
 };
 
+/// The classes that a saved state may hold.
+inline std::shared_ptr<const CodingClassTable> savedClasses() {
+    return std::make_shared<const CodingClassTable>(
+        CodingClassTable{CodingClass::of<OWTransitIncidentViewControllerState>(
+                             "OWTransitIncidentViewControllerState"),
+                         CodingClass::of<TransitStorageLineItem>("TransitStorageLineItem"),
+                         CodingClass::of<TransitStorageIncident>("TransitStorageIncident")});
+}
+
 /// A profile of its own, a lookup that answers as told, a stopped clock, and a scripted host.
 class WidgetWorld : public ::testing::Test {
 protected:
@@ -267,11 +276,7 @@ private:
     EnvironmentSlot<std::shared_ptr<LookupService>>::Override _lookup =
         LookupService::shared().overrideWith(lookup);
     EnvironmentSlot<std::shared_ptr<const CodingClassTable>>::Override _classes =
-        CodingClassTable::current().overrideWith(std::make_shared<const CodingClassTable>(
-            CodingClassTable{CodingClass::of<OWTransitIncidentViewControllerState>(
-                                 "OWTransitIncidentViewControllerState"),
-                             CodingClass::of<TransitStorageLineItem>("TransitStorageLineItem"),
-                             CodingClass::of<TransitStorageIncident>("TransitStorageIncident")}));
+        CodingClassTable::current().overrideWith(savedClasses());
 };
 
 } // namespace orvo::testing
