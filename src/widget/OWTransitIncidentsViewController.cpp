@@ -36,6 +36,18 @@ NCUpdateResult updateResultOf(const Result& result) {
     return result.isSuccess() ? NCUpdateResult::NewData : NCUpdateResult::Failed;
 }
 
+/// Calls it on the main thread, in a later turn where it is called on another one: whoever looks
+/// the lines up answers where it likes.
+OWTransitIncidentFetcherRequest::CompletionHandler
+onMainThread(OWTransitIncidentFetcherRequest::CompletionHandler handler) {
+    return [handler = std::move(handler)](const std::shared_ptr<Result>& result) {
+        if (RunLoop::isMainThread())
+            handler(result);
+        else
+            DispatchQueue::mainQueue()->async([handler, result] { handler(result); });
+    };
+}
+
 /// A source that leaves a mark for tracing tools, and does nothing else.
 std::shared_ptr<DispatchSource> markingSource(MemoryPressure degree,
                                               const char* event,
@@ -192,23 +204,24 @@ void OWTransitIncidentsViewController::_fetchUpdatesWithCompletitionHandler(Upda
         throw NSInvalidArgumentException("updates are fetched on the main thread");
     if (_request) {
         if (handler)
-            _request->addHandler([handler = std::move(handler)](const auto& result) {
+            _request->addHandler(onMainThread([handler = std::move(handler)](const auto& result) {
                 handler(updateResultOf(*result));
-            });
+            }));
         return;
     }
     const std::weak_ptr<OWTransitIncidentsViewController> weak = strong(this);
     _request =
         OWTransitIncidentFetcher::init()->fetchFavoriteLinesTransitIncidentsWithCompletionHandler(
-            [weak, handler = std::move(handler)](const std::shared_ptr<Result>& result) {
-                const auto self = weak.lock();
-                if (self)
-                    self->setTransitLineItemResult(result);
-                if (handler)
-                    handler(updateResultOf(*result));
-                if (self)
-                    self->_request = nullptr;
-            });
+            onMainThread(
+                [weak, handler = std::move(handler)](const std::shared_ptr<Result>& result) {
+                    const auto self = weak.lock();
+                    if (self)
+                        self->setTransitLineItemResult(result);
+                    if (handler)
+                        handler(updateResultOf(*result));
+                    if (self)
+                        self->_request = nullptr;
+                }));
 }
 
 void OWTransitIncidentsViewController::setTransitLineItemResult(

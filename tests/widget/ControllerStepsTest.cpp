@@ -153,6 +153,43 @@ TEST_F(ControllerSteps, TheModeOfferedIsOfTheDataSourceThatTellsAndTheSizeOfItsO
     EXPECT_THAT(ofTheOther, IsEmpty());
 }
 
+TEST_F(ControllerSteps, AListWithoutExpandedItemsIsOfferedInTheCompactModeOnly) {
+    loadWithDoubles();
+    const auto none = dataSource->listItem();
+    const auto one = withExpandedRow(*none);
+    for (const auto& [list, mode] : {std::pair(one, NCWidgetDisplayMode::Expanded),
+                                     std::pair(none, NCWidgetDisplayMode::Compact)}) {
+        dataSource->setListItem(list);
+        EXPECT_EQ(context->largest, mode);
+    }
+    context->largest = NCWidgetDisplayMode::Expanded; // a host begins with what it likes
+    controller->viewWillAppear(false);
+    EXPECT_EQ(context->largest, NCWidgetDisplayMode::Compact);
+    runUntilFetched();
+}
+
+TEST_F(ControllerSteps, WhatIsAnsweredOnAnotherThreadIsShownOnTheMainThread) {
+    saveFavorites({1, 2});
+    lookup->queue = DispatchQueue::globalQueue();
+    lookup->answerWith(
+        {NSArray::arrayWithObjects({disturbedLine(1, "Works"), disturbedLine(2, "Delays")}),
+         nullptr});
+    loadWithDoubles();
+    dataSource->whenCalled = [](const std::string&) {
+        EXPECT_TRUE(RunLoop::isMainThread());
+    };
+    for (const bool joins : {false, true})
+        controller->widgetPerformUpdateWithCompletionHandler([&, joins](NCUpdateResult) {
+            EXPECT_TRUE(RunLoop::isMainThread());
+            calls.emplace_back(joins ? "answer who joined" : "answer");
+        });
+    ASSERT_TRUE(runUntil([&] { return !calls.empty() && calls.back() == "answer who joined"; }));
+    EXPECT_EQ(calls[calls.size() - 2], "answer");
+    EXPECT_EQ(controller->request(), nullptr);
+    EXPECT_THAT(calls, Contains("update result"));
+    EXPECT_EQ(dataSource->listItem()->expandedItems()->count(), 2U);
+}
+
 TEST_F(ControllerSteps, TheSizeIsThatOfTheContextsModeAndWithoutAContextNone) {
     loadWithDoubles();
     context->mode = NCWidgetDisplayMode::Expanded;
