@@ -418,6 +418,12 @@ TEST(OrvoActivity, HashMultipliesPresentNumbers) {
               (2U * 2654435761ULL) ^ 2654435761ULL ^ NSString::string("a")->hash());
 }
 
+TEST(OrvoActivity, HashOfANegativeNumberIsItsProductModuloTwoToThe64th) {
+    OrvoActivity activity;
+    activity.setCollectionsMode(-1);
+    EXPECT_EQ(activity.hash(), 0ULL - 2654435761ULL);
+}
+
 TEST(OrvoActivity, DictionaryNamesEveryPresentField) {
     const auto dictionary = fullActivity()->dictionaryRepresentation();
     EXPECT_EQ(dictionary->count(), 15U);
