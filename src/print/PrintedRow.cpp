@@ -59,13 +59,13 @@ std::optional<PrintedArtwork> artworkOf(const std::shared_ptr<OWConfiguredArtwor
     return artwork;
 }
 
-PrintedRow rowOf(const OWTransitItem& item) {
+PrintedRow rowOf(const OWTransitItem& item, const PrintedTarget* before) {
     return {.kind = PrintedRow::Kind::Item,
             .primaryText = item.primaryText(),
             .secondaryText = item.secondaryText(),
             .artwork = artworkOf(item.artwork()),
             .artworkHidden = item.isArtworkHidden(),
-            .opens = PrintedTarget::of(item.openable())};
+            .opens = PrintedTarget::of(item.openable(), before)};
 }
 
 PrintedRow rowOf(const OWTransitSummaryItem& item) {
@@ -86,9 +86,9 @@ PrintedRow rowOf(const OWTransitSummaryItem& item) {
 
 } // namespace
 
-PrintedRow PrintedRow::of(const std::shared_ptr<NSObject>& item) {
+PrintedRow PrintedRow::of(const std::shared_ptr<NSObject>& item, const PrintedRow* before) {
     if (const auto row = std::dynamic_pointer_cast<OWTransitItem>(item))
-        return rowOf(*row);
+        return rowOf(*row, before && before->opens ? &*before->opens : nullptr);
     if (const auto summary = std::dynamic_pointer_cast<OWTransitSummaryItem>(item))
         return rowOf(*summary);
     raiseNoRow(item);

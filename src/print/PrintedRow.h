@@ -37,9 +37,11 @@ struct PrintedRow {
     bool artworkHidden = false;
     std::optional<PrintedTarget> opens;
 
-    /// Of an `OWTransitItem` or `OWTransitSummaryItem`.
+    /// Of an `OWTransitItem` or `OWTransitSummaryItem`. `before`, which may be nil: the row before,
+    /// as in `PrintedTarget::of`.
     /// @throws NSInvalidArgumentException for anything else
-    [[nodiscard]] static PrintedRow of(const std::shared_ptr<NSObject>& item);
+    [[nodiscard]] static PrintedRow of(const std::shared_ptr<NSObject>& item,
+                                       const PrintedRow* before = nullptr);
 };
 
 /// What performs the tap on such an item; nil where it cannot be tapped.

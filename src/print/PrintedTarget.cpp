@@ -14,12 +14,13 @@ namespace orvo {
 
 namespace {
 
+constexpr const char* LineKey = "bs";
+
 std::shared_ptr<NSData> payload(const NSDictionary& userInfo, const char* key) {
     return std::dynamic_pointer_cast<NSData>(userInfo.objectForKey(key));
 }
 
-std::optional<std::uint64_t> lineMuid(const NSDictionary& userInfo) {
-    const auto compressed = payload(userInfo, "bs");
+std::optional<std::uint64_t> lineMuid(const std::shared_ptr<NSData>& compressed) {
     const auto bytes = compressed ? NSDataOrvoExtra::bzip2UncompressedData(*compressed) : nullptr;
     const auto activity = bytes ? protoMessageWithBytes<OrvoActivity>(bytes->bytes()) : nullptr;
     if (!activity || !activity->lineItem())
@@ -44,7 +45,8 @@ std::optional<std::vector<std::uint64_t>> incidentMuids(const NSDictionary& user
 
 } // namespace
 
-std::optional<PrintedTarget> PrintedTarget::of(const std::shared_ptr<OWOpenable>& openable) {
+std::optional<PrintedTarget> PrintedTarget::of(const std::shared_ptr<OWOpenable>& openable,
+                                               const PrintedTarget* before) {
     if (!openable)
         return std::nullopt;
     PrintedTarget target;
@@ -59,7 +61,10 @@ std::optional<PrintedTarget> PrintedTarget::of(const std::shared_ptr<OWOpenable>
     target.userInfo = activity->userInfo();
     if (target.userInfo) {
         target.incidentMuids = orvo::incidentMuids(*target.userInfo);
-        target.lineMuid = orvo::lineMuid(*target.userInfo);
+        const auto line = payload(*target.userInfo, LineKey);
+        const bool isSame =
+            line && before && before->userInfo && payload(*before->userInfo, LineKey) == line;
+        target.lineMuid = isSame ? before->lineMuid : orvo::lineMuid(line);
     }
     return target;
 }

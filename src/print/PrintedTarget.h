@@ -21,9 +21,11 @@ struct PrintedTarget {
     std::optional<std::uint64_t> lineMuid = {};
     std::shared_ptr<NSDictionary> userInfo = {}; ///< nil for a URL
 
-    /// Nothing for nil, a row that cannot be tapped.
+    /// Nothing for nil, a row that cannot be tapped. `before`, which may be nil: the target of the
+    /// row before, whose bytes are not read again where they are the very same; rows of one line
+    /// share them, and they hold all of its incidents.
     [[nodiscard]] static std::optional<PrintedTarget>
-    of(const std::shared_ptr<OWOpenable>& openable);
+    of(const std::shared_ptr<OWOpenable>& openable, const PrintedTarget* before = nullptr);
 
     /// For people, in one line.
     [[nodiscard]] std::string text() const;

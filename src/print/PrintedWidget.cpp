@@ -48,8 +48,10 @@ PrintedWidget PrintedWidget::of(const OWTransitListItem& list,
                                 const std::shared_ptr<Result>& result) {
     PrintedWidget widget;
     widget.summary = PrintedRow::of(list.summaryItem());
-    for (const auto& item : typed<NSObject>(list.expandedItems()))
-        widget.expanded.push_back(PrintedRow::of(item));
+    for (const auto& item : typed<NSObject>(list.expandedItems())) {
+        const auto* before = widget.expanded.empty() ? nullptr : &widget.expanded.back();
+        widget.expanded.push_back(PrintedRow::of(item, before));
+    }
     result->withValue_orError(
         [&](const Result::Value& value) {
             judge(widget, std::dynamic_pointer_cast<NSArray>(value));

@@ -46,6 +46,18 @@ TEST_F(PrintedTargetTest, AnIncidentNamesItsLineFromTheBytesHandedOver) {
     EXPECT_EQ(target->text(), "com.zentu.Orvo.Transit.Incident: line 18446744073709551615");
 }
 
+TEST_F(PrintedTargetTest, TheVeryBytesOfTheRowBeforeAreNotReadAgain) {
+    const auto openable = Builder::_userActivityDataForLineItem(testing::line(7, "U1", {}));
+    auto before = *PrintedTarget::of(openable);
+    before.lineMuid = 99; // so that it is seen where the number comes from
+    EXPECT_EQ(PrintedTarget::of(openable, &before)->lineMuid, 99U);
+    const auto other = Builder::_userActivityDataForLineItem(testing::line(7, "U1", {}));
+    EXPECT_EQ(PrintedTarget::of(other, &before)->lineMuid, 7U);
+    const auto url =
+        PrintedTarget::of(NSURLOWOpenable::openableWithURL(NSURL::URLWithString("a:b")));
+    EXPECT_EQ(PrintedTarget::of(other, &*url)->lineMuid, 7U);
+}
+
 TEST_F(PrintedTargetTest, AnIncidentListNamesItsIncidentsInOrder) {
     const auto target =
         PrintedTarget::of(Builder::_activityDataForIncidents({incident(9), incident(2)}));
