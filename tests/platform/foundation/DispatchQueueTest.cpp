@@ -1,6 +1,7 @@
 #include "platform/foundation/DispatchQueue.h"
 
 #include "platform/foundation/RunLoop.h"
+#include "platform/foundation/WorkerThreads.h"
 
 #include <gtest/gtest.h>
 
@@ -10,6 +11,7 @@
 #include <latch>
 #include <set>
 #include <stdexcept>
+#include <string>
 #include <thread>
 #include <vector>
 
@@ -111,6 +113,18 @@ TEST(SerialQueue, IsCurrentInItsOwnBlocksAlone) {
     queue->async([&] { seen.set_value({queue->isCurrent(), other->isCurrent()}); });
     EXPECT_EQ(take(seen.get_future()), (std::pair{true, false}));
     EXPECT_FALSE(queue->isCurrent());
+}
+
+TEST(SerialQueue, ItsBlocksRunUnderItsWholeNameHoweverLongThatIs) {
+    const auto nameIn = [](const std::shared_ptr<DispatchQueue>& queue) {
+        std::promise<std::string> name;
+        queue->async([&] { name.set_value(WorkerThreads::currentName()); });
+        return take(name.get_future());
+    };
+    EXPECT_EQ(nameIn(DispatchQueue::serialQueue("a.name.longer.than.the.system.keeps")),
+              "a.name.longer.than.the.system.keeps");
+    EXPECT_EQ(nameIn(DispatchQueue::globalQueue()), "worker");
+    EXPECT_EQ(WorkerThreads::currentName(), "") << "the main thread is no worker";
 }
 
 TEST(SerialQueue, StillRunsItsBlocksAfterTheLastReferenceHasGone) {
