@@ -49,6 +49,8 @@ std::string cureOf(const NSError& error) {
 
 } // namespace
 
+// A command asks its context for whatever is outside of it, as an object.
+// NOLINTNEXTLINE(readability-convert-member-functions-to-static)
 double CommandContext::now() const {
     return NSDate::date()->timeIntervalSince1970();
 }

@@ -21,9 +21,10 @@ public:
     static EnvironmentSlot<std::shared_ptr<SystemController>>& instance();
 
     /// Hands `activity` to the application and lets it come to the front. With
-    /// `requirePromptUnlockDevice` a locked screen is asked to unlock first. The handler, which may
-    /// be empty, is called once, on the main queue, never inside the call: with true when the
-    /// application took it, else with false and the reason. A nil application cannot be opened.
+    /// `requirePromptUnlockDevice` a locked screen is asked to unlock first, where the system lets
+    /// a program ask. The handler, which may be empty, is called once, on the main queue, never
+    /// inside the call: with true when the application took it, else with false and the reason. A
+    /// nil application cannot be opened.
     virtual void
     openUserActivity_withApplicationProxy_requireOptionKeyPromptUnlockDevice_completionHandler(
         const std::shared_ptr<NSUserActivity>& activity,
