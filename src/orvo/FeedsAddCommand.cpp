@@ -151,6 +151,14 @@ void FeedsAddCommand::tryAlerts(const FeedConfiguration& feed, CommandContext& c
                 fmt::format("the alerts {} cannot be read now: {}", location, reason),
                 fmt::format("Try again later with: orvo feeds check {}", feed.name));
         }
+        const auto others = statistics.alerts.count(AlertCount::OtherEntities);
+        if (others > 0 && statistics.alerts.count(AlertCount::Alerts) == 0)
+            context.terminal().warning(
+                fmt::format("the alerts of {} have {} and no alert",
+                            feed.name,
+                            Counted::text(others, "other entry", "other entries")),
+                "Where they are trip updates or vehicles, its lines would always look fine: give "
+                "the address of the service alerts, with --replace.");
     }
 }
 

@@ -31,6 +31,31 @@ TEST_F(FeedsCommandsTest, UnreadableAlertsAreAWarningAndTheFeedIsAdded) {
     EXPECT_THAT(answered({"feeds", "list"}), HasSubstr("city\t13\t"));
 }
 
+TEST_F(FeedsCommandsTest, AlertsThatAreOfAnotherKindAreAWarning) {
+    const std::string header("\x0A\x05\x0A\x03"
+                             "2.0",
+                             7);
+    const std::string tripUpdate("\x12\x07\x0A\x01"
+                                 "a"
+                                 "\x1A\x02\x0A\x00",
+                                 9);
+    const auto addWith = [&](const std::string& bytes) {
+        return run({"feeds",
+                    "add",
+                    "city",
+                    "--replace",
+                    "--static",
+                    writeSchedule(),
+                    "--alerts",
+                    write("other.pb", bytes)});
+    };
+    const auto answer = addWith(header + tripUpdate + tripUpdate);
+    EXPECT_EQ(answer.code, ExitCode::Answered);
+    EXPECT_THAT(answer.error, HasSubstr("the alerts of city have 2 other entries and no alert\n"));
+    EXPECT_THAT(answer.error, HasSubstr("trip updates"));
+    EXPECT_EQ(addWith(header).error, "");
+}
+
 TEST_F(FeedsCommandsTest, AnUnreadableScheduleAddsNothing) {
     const auto notASchedule = write("x.zip", "not a zip");
     EXPECT_THAT(refused({"feeds", "add", "city", "--static", notASchedule, "--alerts", "a.pb"}),
