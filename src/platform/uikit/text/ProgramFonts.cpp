@@ -7,6 +7,7 @@
 #include <array>
 #include <cstdlib>
 #include <fontconfig/fontconfig.h>
+#include <utility>
 
 namespace orvo::ProgramFonts {
 
@@ -21,6 +22,9 @@ constexpr std::array Files{FaceFile{400, "/usr/share/fonts/opentype/inter/Inter-
                            FaceFile{500, "/usr/share/fonts/opentype/inter/Inter-Medium.otf"},
                            FaceFile{600, "/usr/share/fonts/opentype/inter/Inter-SemiBold.otf"},
                            FaceFile{700, "/usr/share/fonts/opentype/inter/Inter-Bold.otf"}};
+
+// All before bold, which no row has: a start need not read it.
+constexpr std::size_t FacesOfRows = 3;
 
 constexpr int NeverLookedAtAgain = 0;
 constexpr char16_t LastPlainCharacter = 0x7E; // every font has the characters until this one
@@ -41,9 +45,13 @@ public:
         return fonts;
     }
 
-    [[nodiscard]] const Face& nearest(int weight) const {
-        return *std::ranges::min_element(
-            _faces, {}, [weight](const Face& face) { return std::abs(face.weight - weight); });
+    [[nodiscard]] const Face& nearest(int weight) {
+        const auto* const file = std::ranges::min_element(
+            Files, {}, [weight](const FaceFile& other) { return std::abs(other.weight - weight); });
+        const auto index = static_cast<std::size_t>(file - Files.begin());
+        if (index >= _readFaces)
+            readFaces(Files.size());
+        return _faces.at(index);
     }
 
     void makeReadyFor(const QString& text) {
@@ -59,9 +67,7 @@ private:
             _haveSystemFonts = true;
         else
             useNoOtherFonts();
-        readSet();
-        if (!_haveSystemFonts && std::ranges::any_of(_faces, &QString::isEmpty, &Face::family))
-            readSystemFonts();
+        readFaces(FacesOfRows);
     }
 
     /// A configuration in which nothing stands: the toolkit takes the current one as it finds it.
@@ -72,24 +78,31 @@ private:
         FcConfigDestroy(empty); // our reference
     }
 
-    /// All faces at once: whenever one is added, the toolkit forgets every font that it has opened,
-    /// and opens it again beside the one that a text still holds.
-    void readSet() {
-        std::ranges::transform(Files, _identifiers.begin(), [](const FaceFile& file) {
-            return QFontDatabase::addApplicationFont(file.path);
-        });
-        for (std::size_t i = 0; i < Files.size(); ++i)
+    /// Together: whenever one is added, the toolkit forgets every font that it has opened, and
+    /// opens it again beside the one that a text still holds.
+    void readFaces(std::size_t count) {
+        const auto first = _readFaces;
+        for (; _readFaces < count; ++_readFaces)
+            _identifiers.at(_readFaces) =
+                QFontDatabase::addApplicationFont(Files.at(_readFaces).path);
+        bool isMissing = false;
+        for (auto i = first; i < count; ++i) {
             _faces.at(i) = {QFontDatabase::applicationFontFamilies(_identifiers.at(i)).value(0, ""),
                             Files.at(i).weight};
+            isMissing |= _faces.at(i).family.isEmpty();
+        }
+        if (isMissing && !_haveSystemFonts)
+            readSystemFonts();
     }
 
     void readSystemFonts() {
         _haveSystemFonts = true;
         FcInitReinitialize();
         // The toolkit looks for fonts anew only when some of its own have gone.
-        for (const int identifier : _identifiers)
-            QFontDatabase::removeApplicationFont(identifier);
-        readSet();
+        const auto count = std::exchange(_readFaces, 0);
+        for (std::size_t i = 0; i < count; ++i)
+            QFontDatabase::removeApplicationFont(_identifiers.at(i));
+        readFaces(count);
     }
 
     static bool lacksSomethingOf(const QString& text) {
@@ -119,6 +132,7 @@ private:
     }
 
     bool _haveSystemFonts = false;
+    std::size_t _readFaces = 0;
     std::array<int, Files.size()> _identifiers{};
     std::array<Face, Files.size()> _faces;
 };

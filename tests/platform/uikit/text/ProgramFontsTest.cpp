@@ -60,6 +60,14 @@ TEST_F(ProgramFontsTest, TheSetAloneIsReadAsLongAsItIsEnough) {
     EXPECT_EQ(readFamilies(), set);
 }
 
+TEST_F(ProgramFontsTest, BoldWhichNoRowHasIsReadWhenItIsAskedFor) {
+    EXPECT_FALSE(QFontDatabase::styles("Inter").contains("Bold"));
+    EXPECT_EQ(ProgramFonts::faceOf(650).weight, 600);
+    EXPECT_FALSE(QFontDatabase::styles("Inter").contains("Bold"));
+    EXPECT_EQ(ProgramFonts::faceOf(700).family, "Inter");
+    EXPECT_TRUE(QFontDatabase::styles("Inter").contains("Bold"));
+}
+
 TEST_F(ProgramFontsTest, ACharacterThatTheSetLacksBringsTheFontsOfTheSystem) {
     const auto before = picture(OfTheSet);
     static_cast<void>(picture("中央駅"));

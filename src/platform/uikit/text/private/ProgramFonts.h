@@ -10,10 +10,11 @@ struct Face {
     int weight;
 };
 
-/// The one of the nearest weight. The first call reads the set, and as long as that is enough, no
-/// other font: reading the system's costs a start more than all else. They are read at once where
-/// the set is not installed, and where the toolkit's own widgets are shown, which write in them.
-/// Main thread, with a graphical application object.
+/// The one of the nearest weight. The first call reads those of up to semibold, the first that is
+/// bolder the rest; and as long as the set is enough, no other font: reading the system's costs a
+/// start more than all else. They are read at once where the set is not installed, and where the
+/// toolkit's own widgets are shown, which write in them. Main thread, with a graphical application
+/// object.
 [[nodiscard]] const Face& faceOf(int weight);
 
 /// To be called before a text is shaped: reads the system's fonts when the set lacks one of its
