@@ -202,14 +202,23 @@ void OWTransitIncidentsViewController::widgetActiveDisplayModeDidChange_withMaxi
 void OWTransitIncidentsViewController::_fetchUpdatesWithCompletitionHandler(UpdateHandler handler) {
     if (!RunLoop::isMainThread())
         throw NSInvalidArgumentException("updates are fetched on the main thread");
+    const std::weak_ptr<OWTransitIncidentsViewController> weak = strong(this);
     if (_request) {
         if (handler)
-            _request->addHandler(onMainThread([handler = std::move(handler)](const auto& result) {
-                handler(updateResultOf(*result));
-            }));
+            _request->addHandler(
+                onMainThread([weak, handler = std::move(handler)](const auto& result) {
+                    const auto answer = [handler, result] {
+                        handler(updateResultOf(*result));
+                    };
+                    const auto self = weak.lock();
+                    // On another thread it has ended, and who began it is still to hear: first.
+                    if (self && self->_transitLineItemResult != result)
+                        DispatchQueue::mainQueue()->async(answer);
+                    else
+                        answer();
+                }));
         return;
     }
-    const std::weak_ptr<OWTransitIncidentsViewController> weak = strong(this);
     _request =
         OWTransitIncidentFetcher::init()->fetchFavoriteLinesTransitIncidentsWithCompletionHandler(
             onMainThread(

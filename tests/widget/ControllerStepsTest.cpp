@@ -3,6 +3,8 @@
 
 #include <gmock/gmock.h>
 
+#include <future>
+
 namespace orvo {
 namespace {
 
@@ -168,26 +170,61 @@ TEST_F(ControllerSteps, AListWithoutExpandedItemsIsOfferedInTheCompactModeOnly) 
     runUntilFetched();
 }
 
-TEST_F(ControllerSteps, WhatIsAnsweredOnAnotherThreadIsShownOnTheMainThread) {
-    saveFavorites({1, 2});
-    lookup->queue = DispatchQueue::globalQueue();
-    lookup->answerWith(
-        {NSArray::arrayWithObjects({disturbedLine(1, "Works"), disturbedLine(2, "Delays")}),
-         nullptr});
-    loadWithDoubles();
-    dataSource->whenCalled = [](const std::string&) {
-        EXPECT_TRUE(RunLoop::isMainThread());
-    };
-    for (const bool joins : {false, true})
-        controller->widgetPerformUpdateWithCompletionHandler([&, joins](NCUpdateResult) {
+/// Its lookup waits for the test, on a thread of its own, and then has two disturbed lines.
+class LookupOnAnotherThread : public ControllerSteps {
+protected:
+    LookupOnAnotherThread() {
+        saveFavorites({1, 2});
+        lookup->queue = queue;
+        lookup->answerWith(
+            {NSArray::arrayWithObjects({disturbedLine(1, "Works"), disturbedLine(2, "Delays")}),
+             nullptr});
+        queue->async([opened = gate.get_future().share()] { opened.wait(); });
+        loadWithDoubles();
+        dataSource->whenCalled = [](const std::string&) {
             EXPECT_TRUE(RunLoop::isMainThread());
-            calls.emplace_back(joins ? "answer who joined" : "answer");
+        };
+    }
+    void ask(const char* name) {
+        controller->widgetPerformUpdateWithCompletionHandler([this, name](NCUpdateResult) {
+            EXPECT_TRUE(RunLoop::isMainThread());
+            calls.emplace_back(name);
         });
-    ASSERT_TRUE(runUntil([&] { return !calls.empty() && calls.back() == "answer who joined"; }));
-    EXPECT_EQ(calls[calls.size() - 2], "answer");
-    EXPECT_EQ(controller->request(), nullptr);
-    EXPECT_THAT(calls, Contains("update result"));
-    EXPECT_EQ(dataSource->listItem()->expandedItems()->count(), 2U);
+    }
+    void expectAnswersOfBothAfterTheRows() {
+        ASSERT_TRUE(runUntil([this] { return std::ranges::count(calls, "second") > 0; }));
+        EXPECT_THAT(calls, Contains("update result"));
+        EXPECT_EQ(dataSource->listItem()->expandedItems()->count(), 2U);
+        ASSERT_GE(calls.size(), 3U);
+        EXPECT_EQ(calls[calls.size() - 2], "first");
+        EXPECT_EQ(calls.back(), "second");
+        EXPECT_EQ(controller->request(), nullptr);
+    }
+
+    std::promise<void> gate;
+    std::shared_ptr<DispatchQueue> queue = DispatchQueue::serialQueue("lookup");
+};
+
+TEST_F(LookupOnAnotherThread, WhatItAnswersIsShownOnTheMainThread) {
+    ask("first");
+    ask("second");
+    gate.set_value();
+    expectAnswersOfBothAfterTheRows();
+}
+
+TEST_F(LookupOnAnotherThread, WhoAsksWhenItHasEndedButNothingIsShownIsAnsweredAfterTheRows) {
+    ask("first");
+    ASSERT_TRUE(runUntil([this] {
+        const auto asked = lookup->asked();
+        return !asked.empty() && asked[0].submissions == 1;
+    }));
+    gate.set_value();
+    std::promise<void> ended;
+    queue->async([&] { ended.set_value(); });
+    ended.get_future().wait();
+    ask("second");
+    EXPECT_THAT(calls, IsEmpty());
+    expectAnswersOfBothAfterTheRows();
 }
 
 TEST_F(ControllerSteps, TheSizeIsThatOfTheContextsModeAndWithoutAContextNone) {
