@@ -8,10 +8,12 @@ std::optional<IncidentPage> incidentPageOf(const HandOff::Content& content,
         return std::nullopt;
     std::shared_ptr<NSError> unreadable; // names are a help; without them the rest is still told
     const auto schedules = context.schedules(unreadable);
-    if (const auto* line = std::get_if<HandOff::Line>(&content))
-        return IncidentPage::ofLine(*line->line, schedules.get());
-    return IncidentPage::ofIncidents(std::get<HandOff::Incidents>(content).incidents,
-                                     schedules.get());
+    const auto* const line = std::get_if<HandOff::Line>(&content);
+    auto page = line ? IncidentPage::ofLine(*line->line, schedules.get())
+                     : IncidentPage::ofIncidents(std::get<HandOff::Incidents>(content).incidents,
+                                                 schedules.get());
+    page.putCurrentFirst(context.now());
+    return page;
 }
 
 } // namespace orvo

@@ -32,6 +32,8 @@ ExitCode ShowCommand::run(const Arguments& arguments, CommandContext& context) {
     if (!kept) {
         context.terminal().note(
             "Nothing has been handed over yet. Tap a row of the widget, or: orvo open URL");
+        if (!arguments.has("demo"))
+            context.terminal().note("What was tapped in the demonstration city: orvo show --demo");
         return ExitCode::Answered;
     }
     const auto content = kept->handOff.content(&error);

@@ -120,6 +120,18 @@ TEST_F(HandOffCommandsTest, NothingHandedOverIsSaidSo) {
     EXPECT_EQ(shown.code, ExitCode::Answered);
     EXPECT_EQ(shown.output, "");
     EXPECT_THAT(shown.error, HasSubstr("Nothing has been handed over yet"));
+    EXPECT_THAT(shown.error, HasSubstr("orvo show --demo"));
+    EXPECT_THAT(run({"show", "--demo"}).error, Not(HasSubstr("orvo show --demo")));
+}
+
+TEST_F(HandOffCommandsTest, WhatIsGoingOnIsToldBeforeWhatIsToCome) {
+    const auto tomorrow = TransitIncidentRecord::initWithFields(
+        {.muid = 1,
+         .startDate = NSDate::dateWithTimeIntervalSince1970(Now + 86400),
+         .title = "Strike"});
+    const auto works = TransitIncidentRecord::initWithFields({.muid = 2, .title = "Works"});
+    const auto text = told(testing::tapOnLine(testing::lineWith({tomorrow, works})));
+    EXPECT_LT(text.find("Works"), text.find("Strike"));
 }
 
 TEST_F(HandOffCommandsTest, OpenTellsTheFavorites) {

@@ -78,6 +78,10 @@ std::string IncidentPage::Incident::period(double now) const {
     return isUnknown ? std::string() : WindowTexts::period(start, end, now, timeZone);
 }
 
+bool IncidentPage::Incident::isCurrent(double now) const {
+    return (!start || *start <= now) && (!end || now < *end);
+}
+
 std::optional<double> IncidentPage::Incident::nextPeriodChange(double now) const {
     return isUnknown ? std::nullopt : PeriodText::nextChange(start, end, now, timeZone);
 }
@@ -114,6 +118,11 @@ IncidentPage::ofIncidents(const std::vector<std::shared_ptr<TransitStorageIncide
     for (const auto& incident : incidents)
         page.incidents.push_back(incidentOf(*incident, std::nullopt, schedules));
     return page;
+}
+
+void IncidentPage::putCurrentFirst(double now) {
+    std::ranges::stable_partition(
+        incidents, [now](const Incident& incident) { return incident.isCurrent(now); });
 }
 
 std::string IncidentPage::heading() const {

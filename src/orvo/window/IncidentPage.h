@@ -36,6 +36,8 @@ struct IncidentPage {
         /// The period in words, with the clock of the agency's place. Empty for a status that is
         /// unknown.
         [[nodiscard]] std::string period(double now) const;
+        /// Whether it is going on at `now`: as of `start`, and before `end`.
+        [[nodiscard]] bool isCurrent(double now) const;
         /// When those words next change, later than `now`; nothing where they do not.
         [[nodiscard]] std::optional<double> nextPeriodChange(double now) const;
         /// The paragraphs of `text`, each one line; none is empty.
@@ -55,6 +57,9 @@ struct IncidentPage {
     ofIncidents(const std::vector<std::shared_ptr<TransitStorageIncident>>& incidents,
                 const ScheduleStore* schedules);
 
+    /// What is going on at `now` comes before what is only to come, or is over; else the order
+    /// stays.
+    void putCurrentFirst(double now);
     /// The window's title and, of a list, its heading: `M1 · Marrow Bay Transit`, `3 incidents`.
     [[nodiscard]] std::string heading() const;
     /// All that a window shows, in its order, a line of text for each element.

@@ -37,6 +37,19 @@ TEST_F(IncidentPageTest, ALineWithoutIncidentsRunsWell) {
     EXPECT_EQ(pageOfLine({}).shown(Now), "U1\nMetro\nGood service\n");
 }
 
+TEST_F(IncidentPageTest, WhatIsGoingOnStandsBeforeWhatIsToComeOrOverElseTheOrderStays) {
+    IncidentPage page;
+    page.incidents = {{.title = "Strike tomorrow", .start = Now + 1},
+                      {.title = "Over", .end = Now},
+                      {.title = "Works", .start = Now, .end = Now + 60},
+                      {.title = "Unknown", .isUnknown = true}};
+    page.putCurrentFirst(Now);
+    std::vector<std::string> titles;
+    for (const auto& incident : page.incidents)
+        titles.push_back(incident.title);
+    EXPECT_EQ(titles, (std::vector<std::string>{"Works", "Unknown", "Strike tomorrow", "Over"}));
+}
+
 TEST_F(IncidentPageTest, AListShowsItsIncidentsInFull) {
     const auto page = pageOfIncidents({testing::feedIncident(2, "Fire")});
     EXPECT_EQ(page.heading(), "1 incident");
