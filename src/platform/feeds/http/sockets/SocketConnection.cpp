@@ -7,6 +7,7 @@
 #include <QUrl>
 
 #include <memory>
+#include <utility>
 
 namespace orvo {
 
@@ -47,9 +48,9 @@ bool isAskedForURLs(const QNetworkProxy& proxy, const QUrl& url) {
 
 class SocketConnection final : public NetworkConnection {
 public:
-    SocketConnection(const std::string& url, const Handlers& handlers)
+    SocketConnection(const std::string& url, Handlers handlers)
         : _url(QUrl::fromEncoded(QByteArray::fromStdString(url)))
-        , _handlers(handlers)
+        , _handlers(std::move(handlers))
         , _socket(socketFor(_url)) {
         watch();
     }

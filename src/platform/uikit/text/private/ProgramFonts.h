@@ -7,7 +7,7 @@ namespace orvo::ProgramFonts {
 /// One face of the program's font set.
 struct Face {
     QString family; ///< empty where the set is not installed: the toolkit's own choice
-    int weight;
+    int weight = 0;
 };
 
 /// The one of the nearest weight. The first call reads those of up to semibold, the first that is
