@@ -7,10 +7,8 @@
 #include <string>
 #include <vector>
 
-namespace orvo {
-
 /// Values of the user defaults as a person writes and reads them.
-namespace DefaultsValue {
+namespace orvo::DefaultsValue {
 
 /// The kinds that a person can write.
 [[nodiscard]] const std::vector<std::string>& kinds();
@@ -24,6 +22,4 @@ namespace DefaultsValue {
 /// The same as JSON's own kinds where it has them.
 void add(JsonWriter& json, const NSObject& value);
 
-} // namespace DefaultsValue
-
-} // namespace orvo
+} // namespace orvo::DefaultsValue

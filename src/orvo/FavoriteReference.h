@@ -7,12 +7,10 @@
 #include <string>
 #include <vector>
 
-namespace orvo {
-
 /// How a person names one of their favourites: its number in the list from 1, `FEED:ROUTE_ID`, or
 /// its name where only one has it. A favourite whose name is a number is named by it only when
 /// there is no such number in the list.
-namespace FavoriteReference {
+namespace orvo::FavoriteReference {
 
 struct Answer {
     std::optional<std::size_t> index; ///< into the entries
@@ -27,6 +25,4 @@ struct Answer {
 /// `FEED:ROUTE_ID`; nothing for a place, or a line of no feed.
 [[nodiscard]] std::optional<std::string> lineNameOf(const NSObject& favorite);
 
-} // namespace FavoriteReference
-
-} // namespace orvo
+} // namespace orvo::FavoriteReference

@@ -5,15 +5,11 @@
 
 #include <vector>
 
-namespace orvo {
-
 /// A lookup of everything that feeds hold, for what it tells about the feeds.
-namespace FeedInspection {
+namespace orvo::FeedInspection {
 
 /// Asks the feeds' sources now and waits. The schedules are the context's.
 [[nodiscard]] FeedLookup::Answer of(const std::vector<FeedConfiguration>& feeds,
                                     CommandContext& context);
 
-} // namespace FeedInspection
-
-} // namespace orvo
+} // namespace orvo::FeedInspection

@@ -5,11 +5,9 @@
 
 #include <functional>
 
-namespace orvo {
-
 /// Takes what is handed over: reads it, keeps it as the last one of the profile in use, and tells
 /// it.
-namespace HandOffReceiver {
+namespace orvo::HandOffReceiver {
 
 /// The map application's name on the bus and of its desktop file.
 inline constexpr const char* ApplicationIdentifier = "com.zentu.Orvo";
@@ -35,6 +33,4 @@ using Showing = std::function<void(const HandOff::Content& content)>;
                                       CommandContext& context,
                                       Audience audience = Audience::Terminal);
 
-} // namespace HandOffReceiver
-
-} // namespace orvo
+} // namespace orvo::HandOffReceiver

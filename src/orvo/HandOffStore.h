@@ -4,11 +4,9 @@
 
 #include <optional>
 
-namespace orvo {
-
 /// What was handed over last, kept in the state folder of the profile in use: `hand-off.plist`,
 /// with the time at which it came. Any process.
-namespace HandOffStore {
+namespace orvo::HandOffStore {
 
 struct Kept {
     HandOff handOff;
@@ -23,6 +21,4 @@ struct Kept {
 /// cannot be read.
 [[nodiscard]] std::optional<Kept> last(std::shared_ptr<NSError>* error);
 
-} // namespace HandOffStore
-
-} // namespace orvo
+} // namespace orvo::HandOffStore

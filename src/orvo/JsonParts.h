@@ -6,16 +6,12 @@
 #include <memory>
 #include <optional>
 
-namespace orvo {
-
 /// What several commands' JSON has in common.
-namespace JsonParts {
+namespace orvo::JsonParts {
 
 /// `"error": null | {"domain", "code", "message"}` as the next member.
 void addError(JsonWriter& json, const std::shared_ptr<NSError>& error);
 /// `"KEY": "2024-07-24T01:28:40Z"`, or null, of seconds since 1970.
 void addTime(JsonWriter& json, std::string_view key, std::optional<double> time);
 
-} // namespace JsonParts
-
-} // namespace orvo
+} // namespace orvo::JsonParts

@@ -6,10 +6,8 @@
 #include <string>
 #include <string_view>
 
-namespace orvo {
-
 /// How a person names a line: `FEED:ROUTE_ID`, or a short or long name that only one line has.
-namespace LineReference {
+namespace orvo::LineReference {
 
 struct Answer {
     std::optional<ScheduleLine> line;
@@ -22,6 +20,4 @@ struct Answer {
 /// `FEED:ROUTE_ID` of a line.
 [[nodiscard]] std::string nameOf(std::string_view feed, std::string_view routeId);
 
-} // namespace LineReference
-
-} // namespace orvo
+} // namespace orvo::LineReference

@@ -6,10 +6,8 @@
 #include <string>
 #include <vector>
 
-namespace orvo {
-
 /// The lines of a report whose status is unknown, with why, and what a person can do.
-namespace UnknownLines {
+namespace orvo::UnknownLines {
 
 /// Lines of one feed that are unknown for one reason.
 struct Group {
@@ -27,6 +25,4 @@ struct Group {
 /// Warns of each on the terminal.
 void warn(const IncidentReport& report, CommandContext& context);
 
-} // namespace UnknownLines
-
-} // namespace orvo
+} // namespace orvo::UnknownLines

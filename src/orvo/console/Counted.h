@@ -4,10 +4,8 @@
 #include <string>
 #include <string_view>
 
-namespace orvo {
-
 /// Numbers of things in words.
-namespace Counted {
+namespace orvo::Counted {
 
 /// `1,234`.
 [[nodiscard]] std::string grouped(std::uint64_t number);
@@ -15,6 +13,4 @@ namespace Counted {
 [[nodiscard]] std::string
 text(std::uint64_t number, std::string_view singular, std::string_view plural);
 
-} // namespace Counted
-
-} // namespace orvo
+} // namespace orvo::Counted

@@ -4,12 +4,10 @@
 #include <string_view>
 #include <vector>
 
-namespace orvo {
-
 /// Text as a terminal shows it, measured in columns: East Asian wide characters and emoji take two,
 /// combining marks and format characters none. All texts are UTF-8; a bad byte counts as one
 /// column.
-namespace DisplayText {
+namespace orvo::DisplayText {
 
 [[nodiscard]] std::size_t width(std::string_view text);
 
@@ -24,6 +22,4 @@ namespace DisplayText {
 /// become one blank; characters that override the direction of writing are left out.
 [[nodiscard]] std::string oneLine(std::string_view text);
 
-} // namespace DisplayText
-
-} // namespace orvo
+} // namespace orvo::DisplayText

@@ -6,11 +6,9 @@
 #include <string>
 #include <vector>
 
-namespace orvo {
-
 /// The words of the windows in the person's language, from the table `Windows` of the program's
 /// resources. Any thread.
-namespace WindowTexts {
+namespace orvo::WindowTexts {
 
 /// The text of a key; the key itself where it is missing.
 [[nodiscard]] std::string text(const std::string& key);
@@ -30,6 +28,4 @@ namespace WindowTexts {
                                  double now,
                                  const std::optional<std::string>& timeZone);
 
-} // namespace WindowTexts
-
-} // namespace orvo
+} // namespace orvo::WindowTexts

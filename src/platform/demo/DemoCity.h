@@ -3,11 +3,9 @@
 #include <string>
 #include <vector>
 
-namespace orvo {
-
 /// A city that does not exist, for people who have no feeds yet: what stays the same whenever it is
 /// written.
-namespace DemoCity {
+namespace orvo::DemoCity {
 
 /// The short name of its feed.
 inline constexpr const char* FeedName = "city";
@@ -46,6 +44,4 @@ struct Line {
 /// The stop that the visitor lives at.
 [[nodiscard]] const Stop& favoritePlace();
 
-} // namespace DemoCity
-
-} // namespace orvo
+} // namespace orvo::DemoCity

@@ -5,12 +5,10 @@
 #include <memory>
 #include <string>
 
-namespace orvo {
-
 /// Sets the demonstration city up in the profile in use, which must be the demonstration's: its
 /// schedule, alerts and favourites are written anew for the environment's time, whatever is kept in
 /// memory otherwise; everything else in the profile stays.
-namespace DemoProfile {
+namespace orvo::DemoProfile {
 
 /// Holds while the city's alerts come from a live server.
 class Live {
@@ -39,6 +37,4 @@ private:
 /// one with a server; 0 where it is not current.
 [[nodiscard]] double secondsLeft();
 
-} // namespace DemoProfile
-
-} // namespace orvo
+} // namespace orvo::DemoProfile

@@ -6,12 +6,10 @@
 #include <optional>
 #include <span>
 
-namespace orvo {
-
 /// The form in which a line outlives its schedule: names, system, artworks and origin. It is a
 /// message whose fields are numbered, so that later versions read earlier ones' and the other way
 /// round.
-namespace StoredTransitLine {
+namespace orvo::StoredTransitLine {
 
 /// What a line answers about itself, without its service.
 [[nodiscard]] TransitLineRecord::Fields fieldsOf(const TransitLine& line);
@@ -25,6 +23,4 @@ namespace StoredTransitLine {
 /// A `FeedTransitLine` where the line came from a feed. Nil when the bytes are no line.
 [[nodiscard]] std::shared_ptr<TransitLine> decode(std::span<const std::uint8_t> bytes);
 
-} // namespace StoredTransitLine
-
-} // namespace orvo
+} // namespace orvo::StoredTransitLine

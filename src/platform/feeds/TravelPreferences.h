@@ -4,10 +4,8 @@
 
 #include <memory>
 
-namespace orvo {
-
 /// What the person asked for about travelling, kept in the app group's user defaults.
-namespace TravelPreferences {
+namespace orvo::TravelPreferences {
 
 inline constexpr const char* SuiteName = "group.com.zentu.Orvo";
 inline constexpr const char* StepFreeKey = "Orvo.travel.stepFree";
@@ -20,6 +18,4 @@ inline constexpr const char* StepFreeKey = "Orvo.travel.stepFree";
 /// Nil, or why it could not be kept.
 std::shared_ptr<NSError> setAsksForStepFree(bool stepFree);
 
-} // namespace TravelPreferences
-
-} // namespace orvo
+} // namespace orvo::TravelPreferences

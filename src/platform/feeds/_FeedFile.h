@@ -7,11 +7,9 @@
 #include <optional>
 #include <vector>
 
-namespace orvo {
-
 /// The content of the registry's two files. The first holds nothing that must not be seen; the
 /// second knows each secret's source by the feed's name and the location.
-namespace _FeedFile {
+namespace orvo::_FeedFile {
 
 [[nodiscard]] std::shared_ptr<NSDictionary> feeds(const std::vector<FeedConfiguration>& feeds);
 [[nodiscard]] std::shared_ptr<NSDictionary> secrets(const std::vector<FeedConfiguration>& feeds);
@@ -21,6 +19,4 @@ namespace _FeedFile {
 /// Puts the secrets where they belong. False when it is no such list.
 [[nodiscard]] bool addSecrets(const NSObject* list, std::vector<FeedConfiguration>& feeds);
 
-} // namespace _FeedFile
-
-} // namespace orvo
+} // namespace orvo::_FeedFile

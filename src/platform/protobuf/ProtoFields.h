@@ -30,10 +30,10 @@ using ProtoEnumNames = std::span<const char* const>;
 /// A number, a truth value or an enumeration, whose presence is a bit of the message's `_has`.
 template <class Message, class Value>
 struct ProtoScalarField {
-    std::uint32_t number;
-    const char* name;
-    Value Message::*value;
-    std::uint32_t hasBit;
+    std::uint32_t number = 0;
+    const char* name = nullptr;
+    Value Message::*value = nullptr;
+    std::uint32_t hasBit = 0;
     ProtoEnumNames names{}; ///< an enumeration's; else empty
 };
 

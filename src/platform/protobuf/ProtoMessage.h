@@ -27,7 +27,7 @@ public:
     void mergeFrom(const ProtoCodable& other) override;
     [[nodiscard]] std::shared_ptr<NSDictionary> dictionaryRepresentation() const override;
     /// The same class, every field present on both sides or on neither, and present ones equal.
-    [[nodiscard]] bool isEqual(const NSObject* other) const override;
+    [[nodiscard]] bool isEqual(const NSObject* object) const override;
     [[nodiscard]] std::uint64_t hash() const override;
     /// Deep.
     [[nodiscard]] std::shared_ptr<NSObject> copy() const override;

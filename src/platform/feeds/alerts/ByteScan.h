@@ -5,10 +5,8 @@
 #include <cstring>
 #include <string_view>
 
-namespace orvo {
-
 /// Looks at many bytes quickly: eight at a time.
-namespace ByteScan {
+namespace orvo::ByteScan {
 
 inline constexpr std::size_t Word = sizeof(std::uint64_t);
 
@@ -88,6 +86,4 @@ inline constexpr std::size_t Word = sizeof(std::uint64_t);
     return hash ^ (hash >> 32U);
 }
 
-} // namespace ByteScan
-
-} // namespace orvo
+} // namespace orvo::ByteScan

@@ -4,10 +4,8 @@
 #include <string>
 #include <string_view>
 
-namespace orvo {
-
 /// Makes published text fit to be shown.
-namespace TextCleaner {
+namespace orvo::TextCleaner {
 
 /// The most characters of a title, and of any other text.
 inline constexpr std::size_t LongestTitle = 200;
@@ -36,6 +34,4 @@ inline constexpr std::size_t LongestPublished = std::size_t{1} << 20U;
 /// cut.
 [[nodiscard]] std::string capped(std::string text, std::size_t most);
 
-} // namespace TextCleaner
-
-} // namespace orvo
+} // namespace orvo::TextCleaner

@@ -6,10 +6,8 @@
 #include <utility>
 #include <vector>
 
-namespace orvo {
-
 /// Arithmetic of `http://` and `https://` URLs, as text. Any thread.
-namespace HttpURL {
+namespace orvo::HttpURL {
 
 /// What stands before `://` when that can be a scheme; else empty.
 [[nodiscard]] std::string_view scheme(std::string_view text);
@@ -35,6 +33,4 @@ namespace HttpURL {
 [[nodiscard]] std::string percentDecoded(std::string_view text);
 [[nodiscard]] std::string base64(std::string_view text);
 
-} // namespace HttpURL
-
-} // namespace orvo
+} // namespace orvo::HttpURL

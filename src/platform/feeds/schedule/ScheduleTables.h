@@ -8,10 +8,8 @@
 #include <memory>
 #include <optional>
 
-namespace orvo {
-
 /// The tables in which schedules are kept, and their version.
-namespace ScheduleTables {
+namespace orvo::ScheduleTables {
 
 /// What went wrong with the file, in words for the person.
 [[nodiscard]] std::shared_ptr<NSError> failureOf(const SQLiteFailure& failure,
@@ -34,6 +32,4 @@ namespace ScheduleTables {
 [[nodiscard]] std::unique_ptr<SQLiteDatabase>
 openInMemory(const std::optional<std::filesystem::path>& copied, std::shared_ptr<NSError>& error);
 
-} // namespace ScheduleTables
-
-} // namespace orvo
+} // namespace orvo::ScheduleTables

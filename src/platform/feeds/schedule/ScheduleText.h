@@ -4,10 +4,8 @@
 #include <string>
 #include <string_view>
 
-namespace orvo {
-
 /// What values of schedule files are made into.
-namespace ScheduleText {
+namespace orvo::ScheduleText {
 
 /// Without blanks and line breaks at its ends.
 [[nodiscard]] std::string_view trimmed(std::string_view text) noexcept;
@@ -33,6 +31,4 @@ namespace ScheduleText {
 /// A whole number from 0 to 999,999; nothing for anything else.
 [[nodiscard]] std::optional<int> smallNumber(std::string_view text) noexcept;
 
-} // namespace ScheduleText
-
-} // namespace orvo
+} // namespace orvo::ScheduleText
