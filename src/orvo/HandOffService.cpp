@@ -49,6 +49,7 @@ std::shared_ptr<NSError> HandOffService::activate(const ApplicationRequest& requ
 std::shared_ptr<NSError> HandOffService::openURLs(const std::vector<std::string>& urls,
                                                   const ApplicationRequest& request) {
     std::vector<HandOff> handOffs;
+    handOffs.reserve(urls.size());
     for (const auto& url : urls)
         handOffs.push_back(HandOff::ofURL(url));
     return take(handOffs, request);

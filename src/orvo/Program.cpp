@@ -35,6 +35,7 @@
 #include <algorithm>
 #include <fmt/format.h>
 #include <ostream>
+#include <utility>
 
 namespace orvo {
 
@@ -48,7 +49,7 @@ struct Program::Choice {
 };
 
 Program::Program(Terminal terminal)
-    : _terminal(terminal) {
+    : _terminal(std::move(terminal)) {
     const auto add = [this](auto command) {
         _commands.push_back(std::move(command));
     };
