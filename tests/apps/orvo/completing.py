@@ -4,7 +4,8 @@ import os
 import shutil
 import subprocess
 
-# A shell of its own on a terminal, as completion needs one; what it would offer goes into a file.
+# A shell of its own on a terminal, as completion needs one; what it would offer goes into a file. Nothing is typed before its line
+# editor has the terminal: until then the system itself would take \x15 as the order to forget what was typed.
 CAPTURE = r"""
 zmodload zsh/zpty
 zpty shell zsh -f -i
@@ -17,7 +18,8 @@ compadd() {
     fi
     builtin compadd \"\$@\"
 }
-print begin''done"
+zle-line-init() { print begin''done }
+zle -N zle-line-init"
 zpty -r shell text '*begindone*'
 zpty -w -n shell "$LINE"$'\t'
 zpty -w -n shell $'\x15print fin''ished\n'
