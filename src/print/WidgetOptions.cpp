@@ -23,6 +23,7 @@ constexpr std::array Looks{"scale", "text-size", "dark", "contrast"};
 
 std::vector<std::string> textSizes() {
     std::vector<std::string> names;
+    names.reserve(std::size(AllContentSizeCategories));
     for (const auto category : AllContentSizeCategories)
         names.emplace_back(nameOf(category));
     return names;

@@ -207,7 +207,7 @@ ExitCode WidgetProgram::drawPictures(const WidgetScene& scene, const WidgetOptio
         return fail(fmt::format("{}: {}", folder.string(), failed.message()));
     const auto draw = [&](const char* name) {
         const auto file = folder / name;
-        const auto failure = WidgetSnapshot::write(scene, options.traits.displayScale, file);
+        auto failure = WidgetSnapshot::write(scene, options.traits.displayScale, file);
         if (!failure)
             _terminal.note("Picture: " + file.string());
         return failure;

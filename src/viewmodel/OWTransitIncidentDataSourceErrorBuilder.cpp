@@ -25,6 +25,7 @@ std::shared_ptr<OWTransitItem> OWTransitIncidentDataSourceErrorBuilder::_buildEr
         std::move(title), _errorMessage(), nullptr, true, nullptr);
 }
 
+// NOLINTNEXTLINE(readability-convert-member-functions-to-static): the name is one of an instance
 std::optional<std::string> OWTransitIncidentDataSourceErrorBuilder::_errorMessage() const {
     switch (static_cast<NetworkFailureDiagnosis>(CurrentNetworkFailureDiagnosis())) {
     case NetworkFailureDiagnosis::None:

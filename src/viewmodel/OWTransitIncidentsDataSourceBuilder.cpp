@@ -314,6 +314,7 @@ void OWTransitIncidentsDataSourceBuilder::cutOverflow(
 }
 
 std::shared_ptr<OWTransitSummaryItem>
+// NOLINTNEXTLINE(readability-convert-member-functions-to-static): the name is one of an instance
 OWTransitIncidentsDataSourceBuilder::_summaryItemForIncidents_items_itemToLinesMap(
     const std::vector<std::shared_ptr<TransitIncident>>& incidents,
     const std::vector<_OWDisplayedRow>& rows) const {

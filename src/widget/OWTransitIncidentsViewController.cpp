@@ -367,6 +367,7 @@ void OWTransitIncidentsViewController::_saveUIData() {
 }
 
 std::shared_ptr<OWTransitIncidentViewControllerState>
+// NOLINTNEXTLINE(readability-convert-member-functions-to-static): the name is one of an instance
 OWTransitIncidentsViewController::_loadSavedUIData() {
     const auto defaults = OrvoGroup::__orvo_groupUserDefaults();
     const auto stored = defaults->objectForKey(SavedStateKey);

@@ -121,8 +121,9 @@ IncidentPage::ofIncidents(const std::vector<std::shared_ptr<TransitStorageIncide
 }
 
 void IncidentPage::putCurrentFirst(double now) {
-    std::ranges::stable_partition(
-        incidents, [now](const Incident& incident) { return incident.isCurrent(now); });
+    std::stable_partition(incidents.begin(), incidents.end(), [now](const Incident& incident) {
+        return incident.isCurrent(now);
+    });
 }
 
 std::string IncidentPage::heading() const {

@@ -340,6 +340,7 @@ void WidgetHost::networkDidChange() {
     _schedule->somethingChanged();
 }
 
+// NOLINTNEXTLINE(readability-make-member-function-const): what it holds changes
 void WidgetHost::didReceiveMemoryWarning() {
     controller()->didReceiveMemoryWarning();
 }

@@ -80,6 +80,7 @@ void _HeldWidget::end() {
         disappear();
 }
 
+// NOLINTNEXTLINE(readability-make-member-function-const): what it holds changes
 void _HeldWidget::traitsDidChange(const UITraitCollection& previous) {
     if (isLoaded())
         outermost(view())->_traitsDidChange(previous);

@@ -30,7 +30,7 @@ class PressureTrigger final : public MemoryPressureFile {
 public:
     explicit PressureTrigger(FileDescriptor file)
         : _file(std::move(file)) {}
-    int fileDescriptor() const noexcept override { return _file.number(); }
+    [[nodiscard]] int fileDescriptor() const noexcept override { return _file.number(); }
     bool hasHappened() override { return true; }
 
     static std::unique_ptr<MemoryPressureFile> open(const std::filesystem::path& path,
@@ -53,7 +53,7 @@ public:
         : _file(std::move(file))
         , _degree(degree)
         , _count(count()) {}
-    int fileDescriptor() const noexcept override { return _file.number(); }
+    [[nodiscard]] int fileDescriptor() const noexcept override { return _file.number(); }
     /// Reading also makes the file wait for its next change.
     bool hasHappened() override {
         const auto before = std::exchange(_count, count());

@@ -10,6 +10,7 @@
 #include <QPainterPath>
 
 #include <algorithm>
+#include <array>
 #include <cmath>
 
 namespace orvo::ShieldPainter {
@@ -120,13 +121,18 @@ std::shared_ptr<UIImage> imageOf(const QImage& image, double scale) {
 
 } // namespace
 
+double heightOf(std::int64_t shieldSize) noexcept {
+    constexpr std::array<double, 8> Heights = {12, 14, 16, 18, 20, 22, 25, 28};
+    constexpr auto Largest = static_cast<std::int64_t>(Heights.size()) - 1;
+    return Heights.at(static_cast<std::size_t>(std::clamp(shieldSize, std::int64_t{0}, Largest)));
+}
+
 std::shared_ptr<UIImage>
 draw(const TransitShieldDataSource& shield, std::int64_t shieldSize, double scale, bool nightMode) {
     const auto text = QString::fromStdString(shield.shieldText().value_or(""));
     if (text.isEmpty() || !qobject_cast<QGuiApplication*>(QCoreApplication::instance()))
         return nullptr;
-    const double height = Heights[std::clamp<std::int64_t>(
-        shieldSize, 0, static_cast<std::int64_t>(std::size(Heights)) - 1)];
+    const double height = heightOf(shieldSize);
     const auto shape = textShape(text, height);
     const auto type = static_cast<TransitShieldType>(shield.shieldType());
     const bool isDisc = type == TransitShieldType::Metro && text.size() <= DiscCharacters;

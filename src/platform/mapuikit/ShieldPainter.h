@@ -8,8 +8,8 @@
 
 namespace orvo::ShieldPainter {
 
-/// The shields' heights in points, by size 0 to 7.
-inline constexpr double Heights[] = {12, 14, 16, 18, 20, 22, 25, 28};
+/// A shield's height in points, by size 0 to 7; what is below or above counts as the nearest.
+[[nodiscard]] double heightOf(std::int64_t shieldSize) noexcept;
 
 /// Draws a shield in the shape of its mode and the colours of its line: at least as wide as high,
 /// its edges on whole device pixels, its text centred on the height of capitals. A shield without

@@ -9,7 +9,6 @@
 #include "platform/uikit/drawing/Canvas.h"
 
 #include <algorithm>
-#include <iterator>
 
 namespace orvo {
 
@@ -149,9 +148,7 @@ CGSize TransitInfoLabelView::sizeOf(std::size_t index) const {
 }
 
 CGFloat TransitInfoLabelView::lineHeight() const {
-    const auto largest = static_cast<std::int64_t>(std::size(ShieldPainter::Heights)) - 1;
-    const auto size = std::clamp(std::max(_shieldSize, _iconSize), std::int64_t{0}, largest);
-    return ShieldPainter::Heights[size];
+    return ShieldPainter::heightOf(std::max(_shieldSize, _iconSize));
 }
 
 std::shared_ptr<UIFont> TransitInfoLabelView::_textFont() const {

@@ -19,7 +19,7 @@ namespace orvo {
 class HttpResponseParser {
 public:
     /// Of status line and headers, and of the trailers behind chunks.
-    static constexpr std::size_t LongestHead = 64 * 1024;
+    static constexpr std::size_t LongestHead = 65536;
 
     /// More than `maximumBytes` of body are a failure.
     explicit HttpResponseParser(std::uint64_t maximumBytes);

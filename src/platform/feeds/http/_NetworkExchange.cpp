@@ -81,7 +81,7 @@ void _NetworkExchange::sendRequest() {
 
 void _NetworkExchange::read() {
     _lastByteAt = monotonicNow();
-    std::array<char, 64 * 1024> part; // NOLINT(cppcoreguidelines-pro-type-member-init): read into
+    std::array<char, 65536> part; // NOLINT(cppcoreguidelines-pro-type-member-init): read into
     while (!_parser.isComplete()) {
         const auto count = _connection->read(part);
         if (count == 0)

@@ -152,8 +152,8 @@ void CsvReader::appendRun(State state) {
         return character == '"' || (state != State::Quoted &&
                                     (character == ',' || character == '\r' || character == '\n'));
     };
-    const auto stop = std::ranges::find_if(_piece, means);
-    const auto length = static_cast<std::size_t>(stop - _piece.begin());
+    const auto length =
+        static_cast<std::size_t>(std::ranges::find_if(_piece, means) - _piece.begin());
     _row.append(_piece.substr(0, length));
     _piece.remove_prefix(length);
 }

@@ -26,7 +26,7 @@ private:
     std::size_t detect();
     bool convert(std::string_view bytes);
     bool appendUnit(char16_t unit);
-    std::shared_ptr<NSError> badUtf16() const;
+    [[nodiscard]] std::shared_ptr<NSError> badUtf16() const;
 
     static constexpr std::size_t BufferSize = std::size_t{1} << 16;
 

@@ -40,12 +40,14 @@ public:
     ~ZipError() { _library.errorFini(&_error); }
 
     zip_error_t* get() { return &_error; }
-    bool isNoArchive() const { return _library.errorCodeZip(&_error) == ZIP_ER_NOZIP; }
+    [[nodiscard]] bool isNoArchive() const {
+        return _library.errorCodeZip(&_error) == ZIP_ER_NOZIP;
+    }
     std::string text() { return _library.errorText(&_error); }
 
 private:
     const ZipLibrary& _library;
-    zip_error_t _error;
+    zip_error_t _error{};
 };
 
 class ZipStream final : public ScheduleStream {
@@ -81,7 +83,7 @@ std::string headOf(const ScheduleSource& source) {
     std::array<char, HeadLength> head{};
     std::ifstream file(source.path(), std::ios::binary);
     file.read(head.data(), head.size());
-    return std::string(head.data(), static_cast<std::size_t>(file.gcount()));
+    return {head.data(), static_cast<std::size_t>(file.gcount())};
 }
 
 /// What a person should know about bytes that are no zip file.

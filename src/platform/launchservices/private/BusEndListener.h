@@ -27,7 +27,7 @@ public:
 private Q_SLOTS:
     void busIsGone() { _isGone(); }
 
-private:
+private: // NOLINT(readability-redundant-access-specifiers): what stands above are slots
     std::function<void()> _isGone;
 };
 
