@@ -23,6 +23,7 @@ set(MODULE_MAP
   "platform/settings: platform/foundation platform/uikit"
   "platform/extension/window: platform/foundation platform/uikit platform/uikit/drawing platform/uikit/table platform/extension platform/settings"
   "platform/demo: platform/foundation platform/geoservices platform/favorites platform/feeds platform/feeds/schedule platform/feeds/http"
+  "platform/demo/server: platform/foundation platform/demo"
   "shared: platform/foundation"
   "widget/result: platform/foundation"
   "fetching: platform/foundation platform/geoservices platform/favorites platform/mapuikit shared widget/result"
@@ -34,13 +35,13 @@ set(MODULE_MAP
   "orvo/console: platform/foundation"
   "orvo/window: orvo/console platform/foundation platform/protobuf platform/uikit platform/uikit/drawing platform/geoservices platform/favorites platform/feeds/schedule platform/mapuikit platform/settings"
   "print: orvo/console platform/foundation platform/uikit platform/uikit/drawing platform/uikit/text platform/uikit/table platform/extension platform/launchservices platform/geoservices platform/favorites platform/feeds platform/mapuikit platform/demo shared widget/result fetching handoff analytics viewmodel presentation widget"
-  "orvo: orvo/console orvo/window platform/foundation platform/protobuf platform/uikit platform/launchservices platform/geoservices platform/favorites platform/feeds platform/feeds/schedule platform/feeds/alerts platform/feeds/http platform/mapuikit platform/demo shared widget/result fetching handoff"
+  "orvo: orvo/console orvo/window platform/foundation platform/protobuf platform/uikit platform/launchservices platform/geoservices platform/favorites platform/feeds platform/feeds/schedule platform/feeds/alerts platform/feeds/http platform/mapuikit platform/demo platform/demo/server shared widget/result fetching handoff"
 )
 # platform/lockbox and platform/feeds/http/sockets are loadable libraries of their own, made without add_module; no other row may
 # name them.
 # Third-party headers, and the only modules whose .cpp files may name them.
 set(THIRD_PARTY_MAP
-  "qt: platform/foundation platform/uikit/text platform/uikit/drawing platform/uikit platform/extension platform/feeds/http platform/feeds/http/sockets platform/mapuikit platform/launchservices platform/demo platform/settings platform/extension/window orvo/window orvo"
+  "qt: platform/foundation platform/uikit/text platform/uikit/drawing platform/uikit platform/extension platform/feeds/http platform/feeds/http/sockets platform/mapuikit platform/launchservices platform/demo platform/demo/server platform/settings platform/extension/window orvo/window orvo"
   "unicode/: platform/foundation platform/uikit/text platform/feeds/schedule platform/feeds/alerts orvo/console"
   "fontconfig/: platform/uikit/text"
   "sqlite3: platform/sqlite"

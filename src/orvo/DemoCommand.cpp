@@ -1,8 +1,8 @@
 #include "orvo/DemoCommand.h"
 
-#include "platform/demo/DemoAlertServer.h"
 #include "platform/demo/DemoCity.h"
 #include "platform/demo/DemoProfile.h"
+#include "platform/demo/server/DemoAlertServer.h"
 #include "platform/foundation/Environment.h"
 #include "platform/foundation/ISO8601.h"
 #include "platform/foundation/RunLoop.h"

@@ -1,8 +1,8 @@
 #include "platform/demo/DemoProfile.h"
 
 #include "platform/demo/DemoAlertFeed.h"
-#include "platform/demo/DemoAlertServer.h"
 #include "platform/demo/DemoCity.h"
+#include "platform/demo/DemoError.h"
 #include "platform/demo/DemoSchedule.h"
 #include "platform/favorites/FavoritesStore.h"
 #include "platform/feeds/FeedRegistry.h"

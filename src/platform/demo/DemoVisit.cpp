@@ -1,6 +1,6 @@
 #include "platform/demo/DemoVisit.h"
 
-#include "platform/demo/DemoAlertServer.h"
+#include "platform/demo/DemoError.h"
 #include "platform/demo/DemoProfile.h"
 
 #include <algorithm>

@@ -1,6 +1,7 @@
-#include "platform/demo/DemoAlertServer.h"
+#include "platform/demo/server/DemoAlertServer.h"
 
 #include "platform/demo/DemoAlertFeed.h"
+#include "platform/demo/DemoError.h"
 #include "platform/foundation/Hashing.h"
 #include "platform/foundation/NSDate.h"
 

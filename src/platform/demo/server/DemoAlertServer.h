@@ -9,12 +9,6 @@
 
 namespace orvo {
 
-inline constexpr const char* DemoErrorDomain = "DemoErrorDomain";
-enum class DemoErrorCode : std::int64_t {
-    CannotServe = 1, ///< the port is taken or not permitted
-    CannotWrite = 2, ///< the city's files
-};
-
 /// Serves the live incidents of the demonstration city as `/alerts.pb` over HTTP, to this machine
 /// only, with an ETag that stays while the incidents stay. It begins with the environment's wall
 /// clock at the time it is made, and answers on the main thread's run loop while it lives.

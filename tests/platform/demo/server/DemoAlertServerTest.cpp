@@ -1,4 +1,4 @@
-#include "platform/demo/DemoAlertServer.h"
+#include "platform/demo/server/DemoAlertServer.h"
 
 #include "platform/demo/DemoAlertFeed.h"
 #include "platform/foundation/RunLoop.h"
