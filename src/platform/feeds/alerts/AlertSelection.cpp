@@ -46,8 +46,6 @@ public:
     }
 
     void look(std::string_view selectorBytes, Glance& glance) {
-        if (_shapes.isUnwanted(selectorBytes))
-            return;
         AlertSelector selector;
         const std::string_view route = _shapes.routeOf(selectorBytes);
         if (!route.empty())
@@ -149,16 +147,17 @@ private:
         std::vector<bool> slots(slotMask + 1);
         for (const std::uint64_t key : chosenKeys)
             slots[key & slotMask] = true;
-        std::sort(chosenKeys.begin(), chosenKeys.end());
+        SeededNumberSet candidates; // few, and looked for exactly
         std::size_t key = 0;
         for (std::size_t entity = 0; entity < _isChosen.size(); ++entity) {
             const std::size_t end = _endOfKeys[entity];
             for (; key < end; ++key)
-                if (slots[_keys[key] & slotMask] && !_isChosen[entity] &&
-                    std::binary_search(chosenKeys.begin(), chosenKeys.end(), _keys[key]))
-                    return true;
+                if (slots[_keys[key] & slotMask] && !_isChosen[entity])
+                    candidates.insert(_keys[key]);
         }
-        return false;
+        return !candidates.empty() && std::ranges::any_of(chosenKeys, [&](std::uint64_t chosen) {
+            return candidates.contains(chosen);
+        });
     }
 
     void chooseOwners(std::uint64_t key, const Owners& owners, std::vector<std::size_t>& pending) {
@@ -201,6 +200,8 @@ void lookAtAlert(std::string_view alert, Wanted& wanted, Ties& ties, Glance& gla
         switch (cursor.key()) {
         case WireCursor::bytes(5):
             wanted.look(cursor.bytes(), glance);
+            [[fallthrough]];
+        case WireCursor::bytes(1): // mostly the selectors come behind the periods
             cursor.skipWith(
                 [&](const char* from, const char* end) noexcept { return wanted.skim(from, end); });
             break;

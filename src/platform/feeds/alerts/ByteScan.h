@@ -1,11 +1,13 @@
 #pragma once
 
+#include <array>
+#include <bit>
 #include <cstddef>
 #include <cstdint>
 #include <cstring>
 #include <string_view>
 
-/// Looks at many bytes quickly: eight at a time.
+/// Looks at many bytes quickly: eight or sixteen at a time.
 namespace orvo::ByteScan {
 
 inline constexpr std::size_t Word = sizeof(std::uint64_t);
@@ -54,36 +56,42 @@ inline constexpr std::size_t Word = sizeof(std::uint64_t);
     return (all & 0x8080808080808080ULL) == 0;
 }
 
-/// Whether eight bytes are visible ASCII and single blanks, without `<` and `&`. May say no to some
-/// that are, never yes to others.
-[[nodiscard]] constexpr bool isPlainText(std::uint64_t word) noexcept {
-    constexpr std::uint64_t Ones = 0x0101010101010101ULL;
-    constexpr std::uint64_t HighBits = Ones << 7U;
-    // A byte of `x` is 0 where that of `zeros(x)` has its high bit; above the first such byte some
-    // others may have it too.
-    const auto zeros = [](std::uint64_t x) {
-        return (x - Ones) & ~x & HighBits;
-    };
-    const std::uint64_t controls = (word - Ones * ' ') & ~word;
-    const std::uint64_t beyond = word | (word + Ones); // 0x7F and above
-    const std::uint64_t markup = zeros(word ^ (Ones * '<')) | zeros(word ^ (Ones * '&'));
-    const std::uint64_t blanks = zeros(word ^ (Ones * ' '));
-    return (((controls | beyond) & HighBits) | markup | (blanks & (blanks << 8U))) == 0;
+/// So many bytes are compared at once.
+inline constexpr std::size_t Block = 16;
+
+/// Whether a block is visible ASCII and single blanks, without `<` and `&`; the byte behind it,
+/// which can be read, makes no second blank with its last.
+[[nodiscard]] inline bool isPlainText(const char* block) noexcept {
+    using Characters [[gnu::vector_size(Block)]] = signed char;
+    Characters characters{};
+    Characters next{};
+    std::memcpy(&characters, block, Block);
+    std::memcpy(&next, block + 1, Block);
+    // What is beyond ASCII is below 0.
+    const auto others = (characters < ' ') | (characters == '\x7F') | (characters == '<') |
+                        (characters == '&') | ((characters == ' ') & (next == ' '));
+    const auto words = std::bit_cast<std::array<std::uint64_t, Block / Word>>(others);
+    return (words[0] | words[1]) == 0;
 }
 
-/// A hash for tables of this run: quick, and not the same on every machine.
+/// A hash for tables of this run: quick, and not the same on every machine. Every bit of it depends
+/// on every byte, wherever in the text the few lie that differ from one to the next.
 [[nodiscard]] inline std::uint64_t quickHash(std::string_view bytes) noexcept {
     constexpr std::uint64_t Multiplier = 0x9E3779B97F4A7C15ULL;
+    // A product's low bits know nothing of the factors' high ones: they are brought down.
+    const auto mixed = [](std::uint64_t hash) {
+        hash *= Multiplier;
+        return hash ^ (hash >> 32U);
+    };
     std::uint64_t hash = bytes.size() * Multiplier;
     if (bytes.size() < Word) {
         hash ^= shortWord(bytes);
     } else {
         for (std::size_t i = 0; i + Word < bytes.size(); i += Word)
-            hash = (hash ^ wordAt(bytes.data() + i)) * Multiplier;
+            hash = mixed(hash ^ wordAt(bytes.data() + i));
         hash ^= wordAt(bytes.data() + bytes.size() - Word);
     }
-    hash *= Multiplier;
-    return hash ^ (hash >> 32U);
+    return mixed(mixed(hash));
 }
 
 } // namespace orvo::ByteScan

@@ -78,9 +78,11 @@ void ConcernedLines::finishLine() {
     if (_lines.empty())
         return;
     Line& line = _lines.back();
-    const auto members = _members.begin() + static_cast<std::ptrdiff_t>(line.firstMember);
-    std::sort(members, _members.end());
-    _members.erase(std::unique(members, _members.end()), _members.end());
+    if (_members.size() - line.firstMember > 1) { // mostly it is one
+        const auto members = _members.begin() + static_cast<std::ptrdiff_t>(line.firstMember);
+        std::sort(members, _members.end());
+        _members.erase(std::unique(members, _members.end()), _members.end());
+    }
     if (!line.isPart)
         _stops.resize(line.firstStop);
     line.endStop = _stops.size();

@@ -11,7 +11,7 @@ namespace orvo {
 namespace {
 
 /// So many bytes of the normalised text count.
-constexpr std::size_t Counted = 2 * ByteScan::Word;
+constexpr std::size_t Counted = ByteScan::Block;
 /// So many bytes of a text without markup are mostly enough to have them.
 constexpr std::size_t Enough = 48;
 
@@ -21,10 +21,8 @@ std::uint64_t hashOf(std::string_view begin) {
 
 /// Whether the text begins with what counts, just as it would be normalised.
 bool beginsPlainly(std::string_view text) {
-    return text.size() >= Counted && text[0] != ' ' && text[Counted - 1] != ' ' &&
-           !(text[ByteScan::Word - 1] == ' ' && text[ByteScan::Word] == ' ') &&
-           ByteScan::isPlainText(ByteScan::wordAt(text.data())) &&
-           ByteScan::isPlainText(ByteScan::wordAt(text.data() + ByteScan::Word));
+    return text.size() > Counted && text[0] != ' ' && text[Counted - 1] != ' ' &&
+           ByteScan::isPlainText(text.data());
 }
 
 /// The beginning of the text, up to the end of a character.

@@ -57,18 +57,18 @@ std::uint64_t wordEndingWith(std::string_view text, char before) {
     return ByteScan::wordAt(bytes.data());
 }
 
-/// Whether a byte that `mask` covers is a blank or a control character. May say yes wrongly.
-bool mayHaveBlank(std::uint64_t word, std::uint64_t mask) {
-    constexpr std::uint64_t Ones = 0x0101010101010101ULL;
-    const std::uint64_t bytes = word | ~mask;
-    return ((bytes - Ones * (' ' + 1)) & ~bytes & (Ones << 7U)) != 0;
+constexpr std::uint64_t Ones = 0x0101010101010101ULL;
+
+/// Not 0 if one of eight ASCII characters is a blank or a control character. May be so wrongly.
+constexpr std::uint64_t blanksOf(std::uint64_t characters) {
+    return (characters - Ones * (' ' + 1)) & (Ones << 7U);
 }
 
 } // namespace
 
 void SelectorShapes::want(std::string_view route) {
     if (route.size() <= ByteScan::Word)
-        _wanted.set(slotOf(wordEndingWith(route, '\0')));
+        _wanted[slotOf(wordEndingWith(route, '\0'))] = true;
 }
 
 std::string_view SelectorShapes::routeOf(std::string_view selector) {
@@ -78,39 +78,37 @@ std::string_view SelectorShapes::routeOf(std::string_view selector) {
     return route;
 }
 
-bool SelectorShapes::isUnwanted(std::string_view selector) const noexcept {
-    if (selector.size() > Longest)
-        return false;
-    std::array<char, Longest> bytes{};
-    std::copy(selector.begin(), selector.end(), bytes.begin());
-    return isUnwanted(_shapes[selector.size()], bytes.data());
-}
-
 // Without a branch for each word: selectors of unequal lengths follow one another.
 inline bool SelectorShapes::isUnwanted(const Shape& shape, const char* selector) const noexcept {
     std::uint64_t differences = 0;
     for (std::size_t word = 0; word < Words; ++word)
         differences |= (ByteScan::wordAt(selector + word * ByteScan::Word) & shape.mask[word]) ^
                        shape.value[word];
-    const std::uint64_t route = ByteScan::wordAt(selector + shape.routeWord);
+    const std::uint64_t route = ByteScan::wordAt(selector + shape.routeWord) & shape.routeMask;
     // Blanks around a route do not count for the schedule.
-    return differences == 0 && !_wanted[slotOf(route & shape.routeMask)] &&
-           !mayHaveBlank(route, shape.routeMask);
+    return (differences | blanksOf(route | shape.besidesRoute)) == 0 && !_wanted[slotOf(route)];
+}
+
+std::array<char, SelectorShapes::Longest> SelectorShapes::padded(std::string_view bytes) noexcept {
+    std::array<char, Longest> padded{};
+    std::copy(bytes.begin(), bytes.end(), padded.begin());
+    return padded;
 }
 
 const char* SelectorShapes::skim(const char* position, const char* end) const noexcept {
     constexpr unsigned char SelectorKey = WireCursor::bytes(5);
     while (end - position >= 2 && static_cast<unsigned char>(position[0]) == SelectorKey) {
         const std::size_t size = static_cast<unsigned char>(position[1]);
-        const char* const bytes = position + 2;
-        const auto left = static_cast<std::size_t>(end - bytes);
+        const char* const selector = position + 2;
+        const auto left = static_cast<std::size_t>(end - selector);
         if (size > Longest || size > left)
             break;
-        const bool isPassedOver = left >= Longest ? isUnwanted(_shapes[size], bytes)
-                                                  : isUnwanted(std::string_view(bytes, size));
+        const bool isPassedOver = left >= Longest
+                                      ? isUnwanted(_shapes[size], selector)
+                                      : isUnwanted(_shapes[size], padded({selector, size}).data());
         if (!isPassedOver)
             break;
-        position = bytes + size;
+        position = selector + size;
     }
     return position;
 }
@@ -128,8 +126,7 @@ void SelectorShapes::learn(std::string_view selector, std::string_view route) {
             mask[begin + 1] = static_cast<char>(0xFF);
     });
     Shape& shape = _shapes[selector.size()];
-    std::array<char, Longest> value{};
-    std::copy(selector.begin(), selector.end(), value.begin());
+    const std::array<char, Longest> value = padded(selector);
     for (std::size_t word = 0; word < Words; ++word) {
         shape.mask[word] = ByteScan::wordAt(mask.data() + word * ByteScan::Word);
         shape.value[word] =
@@ -137,6 +134,7 @@ void SelectorShapes::learn(std::string_view selector, std::string_view route) {
     }
     shape.routeWord = routeEnd - ByteScan::Word;
     shape.routeMask = wordEndingWith(std::string(route.size(), '\xFF'), '\0');
+    shape.besidesRoute = wordEndingWith(std::string(route.size(), '\0'), '~');
 }
 
 } // namespace orvo

@@ -3,7 +3,6 @@
 #include "platform/feeds/alerts/ByteScan.h"
 
 #include <array>
-#include <bitset>
 #include <cstddef>
 #include <cstdint>
 #include <string_view>
@@ -25,9 +24,6 @@ public:
     /// is remembered.
     [[nodiscard]] std::string_view routeOf(std::string_view selector);
 
-    /// Whether the selector's form is known and its route is not wanted.
-    [[nodiscard]] bool isUnwanted(std::string_view selector) const noexcept;
-
     /// From `position`, where a field of an alert begins, over all selectors whose form is known
     /// and whose route is not wanted, to the first field that is anything else, or to `end`.
     [[nodiscard]] const char* skim(const char* position, const char* end) const noexcept;
@@ -43,20 +39,22 @@ private:
     struct Shape {
         std::array<std::uint64_t, Words> mask{};
         std::array<std::uint64_t, Words> value{1, 1, 1, 1};
-        std::size_t routeWord = 0;   ///< where the word that ends with the route begins
-        std::uint64_t routeMask = 0; ///< the route's bytes in it
+        std::size_t routeWord = 0;      ///< where the word that ends with the route begins
+        std::uint64_t routeMask = 0;    ///< the route's bytes in it
+        std::uint64_t besidesRoute = 0; ///< visible characters in the place of all others
     };
 
     /// Whether a selector that begins here has the shape, and a route that is not wanted. `Longest`
     /// bytes can be read.
     [[nodiscard]] bool isUnwanted(const Shape& shape, const char* selector) const noexcept;
+    [[nodiscard]] static std::array<char, Longest> padded(std::string_view bytes) noexcept;
     [[nodiscard]] static std::size_t slotOf(std::uint64_t routeWord) noexcept {
         return (routeWord * 0x9E3779B97F4A7C15ULL) >> 52U;
     }
     void learn(std::string_view selector, std::string_view route);
 
     std::array<Shape, Longest + 1> _shapes; // by length of the selector
-    std::bitset<Slots> _wanted;             // by the slot of a wanted route's word
+    std::array<bool, Slots> _wanted{};      // by the slot of a wanted route's word
 };
 
 } // namespace orvo

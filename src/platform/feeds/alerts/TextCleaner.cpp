@@ -111,15 +111,13 @@ bool isPlain(std::string_view text) {
         return true;
     if (text.front() == ' ' || text.back() == ' ')
         return false;
-    // Words overlap by a byte, so that blanks are seen in a row wherever they lie.
-    std::size_t i = 0;
-    for (; i + ByteScan::Word <= text.size(); i += ByteScan::Word - 1)
-        if (!ByteScan::isPlainText(ByteScan::wordAt(text.data() + i)))
+    if (text.size() <= ByteScan::Block)
+        return std::ranges::all_of(text, isPlainCharacter) && text.find("  ") == text.npos;
+    const char* const last = text.data() + text.size() - ByteScan::Block - 1;
+    for (const char* block = text.data(); block < last; block += ByteScan::Block)
+        if (!ByteScan::isPlainText(block))
             return false;
-    for (; i < text.size(); ++i)
-        if (!isPlainCharacter(text[i]) || (text[i] == ' ' && text[i + 1] == ' '))
-            return false;
-    return true;
+    return ByteScan::isPlainText(last) && isPlainCharacter(text.back());
 }
 
 /// The text up to the most that is looked at, which ends with a whole character.

@@ -15,7 +15,8 @@ namespace {
 std::string preparedRoute(std::uint64_t number) {
     constexpr std::uint64_t Multiplier = 0x9E3779B97F4A7C15ULL;
     const std::uint64_t begin = number * 0x0101010101010101ULL + 1;
-    const std::uint64_t end = ((2 * ByteScan::Word * Multiplier) ^ begin) * Multiplier;
+    const std::uint64_t product = ((2 * ByteScan::Word * Multiplier) ^ begin) * Multiplier;
+    const std::uint64_t end = product ^ (product >> 32U);
     std::string route(2 * ByteScan::Word, '\0');
     std::memcpy(route.data(), &begin, sizeof begin);
     std::memcpy(route.data() + sizeof begin, &end, sizeof end);
