@@ -20,6 +20,13 @@ TEST(HeaderFingerprint, IsTheSameForTextsThatAreNormalisedAlike) {
     }
 }
 
+TEST(HeaderFingerprint, ABlankThatNothingVisibleFollowsDoesNotCount) {
+    const std::string text = "Line 17 delayed"; // one character less than what counts
+    EXPECT_EQ(headerFingerprint(text + " \x01"), headerFingerprint(text));
+    EXPECT_EQ(headerFingerprint(text + " \n\n"), headerFingerprint(text));
+    EXPECT_NE(headerFingerprint(text + " a"), headerFingerprint(text));
+}
+
 TEST(HeaderFingerprint, TellsTextsApartByTheirBeginning) {
     EXPECT_NE(headerFingerprint("Line 17 delayed: harbour"), headerFingerprint("Line 18 delayed"));
     EXPECT_NE(headerFingerprint("A"), headerFingerprint("B"));

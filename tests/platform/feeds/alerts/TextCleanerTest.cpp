@@ -79,6 +79,16 @@ TEST(TextCleaner, DropsControlAndDirectionOverrideCharacters) {
     EXPECT_EQ(clean("\u200Fשלום\u200E"), "\u200Fשלום\u200E");
 }
 
+TEST(TextCleaner, AControlCharacterIsSeenWhereverItStands) {
+    for (std::size_t length = 1; length < 50; ++length) {
+        for (std::size_t at = 0; at <= length; ++at) {
+            std::string text(length, 'a');
+            text.insert(at, 1, '\x01');
+            EXPECT_EQ(clean(text), std::string(length, 'a')) << length << ' ' << at;
+        }
+    }
+}
+
 TEST(TextCleaner, IsTheSameWhenDoneAgain) {
     for (const std::string text : {"<p>a</p>  b", "\u00A0 x \n\n\n y", "a\u2029\tb", "plain"})
         EXPECT_EQ(clean(clean(text)), clean(text));
