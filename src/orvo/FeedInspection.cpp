@@ -8,7 +8,7 @@ namespace orvo::FeedInspection {
 FeedLookup::Answer of(const std::vector<FeedConfiguration>& feeds, CommandContext& context) {
     (void)RunLoop::main();
     FeedLookup::Answer answer;
-    const auto schedules = context.schedules(answer.error);
+    auto schedules = context.schedules(answer.error);
     if (!schedules)
         return answer;
     auto ground = FeedLookup::profileGround();

@@ -82,6 +82,8 @@ FeedsAddCommand::configurationFrom(const Arguments& arguments) {
         request.query.push_back(std::move(*parameter));
     }
     request.userPassword = arguments.value("user");
+    if (request.userPassword && !split(*request.userPassword, ':'))
+        return UsageError{"--user needs a name and a password", "Write --user NAME:PASSWORD."};
     const auto source = [&](const std::string& location) {
         // What a server must know is no business of a file.
         SourceRequest plain;

@@ -62,7 +62,9 @@ Answer resolve(const ScheduleStore& schedules, const std::string& text) {
         return {std::nullopt, "there are no feeds yet", "Add one with: orvo feeds add"};
     return {std::nullopt,
             fmt::format("no line is called {}", text),
-            fmt::format("Look for it with: orvo lines \"{}\"", text)};
+            colon == std::string::npos
+                ? fmt::format("Look for it with: orvo lines \"{}\"", text)
+                : fmt::format("Nor is there a feed {}: see orvo feeds list", feed)};
 }
 
 } // namespace orvo::LineReference

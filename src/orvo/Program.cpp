@@ -109,6 +109,11 @@ ExitCode Program::run(const std::vector<std::string>& words) {
         _terminal.output() << help;
         return ExitCode::Answered;
     }
+    const auto options = ArgumentParser({.path = choice.path}).parse(choice.rest);
+    if (const auto* error = std::get_if<UsageError>(&options)) {
+        _terminal.error(error->message, error->cure);
+        return ExitCode::WrongUsage;
+    }
     std::string given = "orvo";
     for (const auto& word : choice.path)
         given += " " + word;

@@ -31,7 +31,7 @@ ScheduleImporter::ScheduleImporter(CommandContext& context)
 ScheduleUpdate ScheduleImporter::run(const FeedConfiguration& feed, Wish wish) {
     ScheduleUpdate failed;
     failed.feed = feed.name;
-    const auto schedules = _context.schedules(failed.error);
+    auto schedules = _context.schedules(failed.error);
     if (!schedules)
         return failed;
     auto ground = ScheduleUpdater::profileGround();

@@ -34,9 +34,9 @@ const char* readableOn(unsigned background) {
 void appendShield(std::vector<PrintedShield>& shields,
                   const std::shared_ptr<TransitArtworkDataSource>& artwork) {
     const auto drawn = artwork ? IconManager::shieldOfArtwork(*artwork) : nullptr;
-    if (!drawn || drawn->shieldText().value_or("").empty())
+    if (!drawn)
         return;
-    PrintedShield shield{*drawn->shieldText(), std::nullopt, ""};
+    PrintedShield shield{drawn->shieldText().value_or(""), std::nullopt, ""};
     const auto colours = drawn->shieldColorString().value_or("");
     const auto comma = std::min(colours.find(','), colours.size());
     if (const auto background = colour(std::string_view(colours).substr(0, comma))) {
@@ -44,6 +44,11 @@ void appendShield(std::vector<PrintedShield>& shields,
         const auto given = colours.substr(std::min(comma + 1, colours.size()));
         shield.foreground = colour(given) ? given : readableOn(*background);
     }
+    // A colour alone says nothing in print.
+    if (shield.text.empty() && shield.background)
+        shield.text = artwork->accessibilityText().value_or("");
+    if (shield.text.empty())
+        return;
     shields.push_back(std::move(shield));
 }
 

@@ -11,7 +11,7 @@ namespace orvo {
 
 /// A shield as text and colours.
 struct PrintedShield {
-    std::string text;
+    std::string text; ///< the line's name where its shield is a colour alone; never empty
     std::optional<std::string> background; ///< `RRGGBB`; nothing for a neutral shield
     std::string foreground;                ///< `RRGGBB`; empty for a neutral shield
 };

@@ -25,6 +25,7 @@ TEST_F(FavoritesCommandsTest, AddsNothingWhenOneLineIsNotFound) {
                 HasSubstr("the schedule of city has no line M9"));
     EXPECT_EQ(answered({"favorites", "list"}), "");
     EXPECT_THAT(refused({"favorites", "add", "Nowhere"}), HasSubstr("no line is called Nowhere"));
+    EXPECT_THAT(refused({"favorites", "add", "town:M1"}), HasSubstr("Nor is there a feed town"));
 }
 
 TEST_F(FavoritesCommandsTest, ANameOfSeveralLinesIsRefusedWithTheChoice) {

@@ -95,6 +95,8 @@ TEST_F(FeedsCommandsTest, AddSaysWhatIsMissing) {
                 HasSubstr("--header NAME:VALUE"));
     EXPECT_THAT(refused(with({"--query", "=x"}), ExitCode::WrongUsage),
                 HasSubstr("--query NAME=VALUE"));
+    EXPECT_THAT(refused(with({"--user", "name"}), ExitCode::WrongUsage),
+                HasSubstr("--user NAME:PASSWORD"));
     refused({"feeds", "add", "a:b", "--static", schedule, "--alerts", "a"}, ExitCode::WrongUsage);
 }
 

@@ -12,6 +12,15 @@ TEST_F(ProgramTest, WithoutACommandItIsWronglyUsed) {
               std::string::npos);
 }
 
+TEST_F(ProgramTest, AnUnknownOptionIsNamedThoughNoCommandIsGiven) {
+    EXPECT_EQ(refused({"--nosuch"}, ExitCode::WrongUsage),
+              "orvo: there is no option --nosuch\nSee: orvo --help\n");
+    EXPECT_EQ(refused({"feeds", "-x"}, ExitCode::WrongUsage),
+              "orvo: there is no option -x\nSee: orvo feeds --help\n");
+    EXPECT_EQ(refused({"--demo"}, ExitCode::WrongUsage),
+              "orvo: which command?\nSee: orvo --help\n");
+}
+
 TEST_F(ProgramTest, HelpAndVersionAreAnswers) {
     EXPECT_NE(answered({"--help"}).find("favorites add"), std::string::npos);
     EXPECT_EQ(answered({"--version"}), "orvo " ORVO_VERSION "\n");

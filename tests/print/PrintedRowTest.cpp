@@ -109,6 +109,21 @@ TEST(PrintedRow, AnArtworkWithoutAShieldShowsItsFallbackOrNothing) {
     EXPECT_TRUE(shieldsOf({shield("")}).empty());
 }
 
+TEST(PrintedRow, AColourAloneIsPrintedByItsLinesName) {
+    const auto colour = TransitArtworkDataSource::initWithFields(
+        {.artworkSourceType = 1,
+         .shieldDataSource =
+             TransitShieldDataSource::initWithFields({.shieldColorString = "DA291C,FFFFFF"}),
+         .accessibilityText = "Red Line"});
+    EXPECT_EQ(shieldOf(colour).text, "Red Line");
+    EXPECT_EQ(shieldOf(colour).background, "DA291C");
+    const auto nameless = TransitArtworkDataSource::initWithFields(
+        {.artworkSourceType = 1,
+         .shieldDataSource =
+             TransitShieldDataSource::initWithFields({.shieldColorString = "DA291C,FFFFFF"})});
+    EXPECT_TRUE(shieldsOf({nameless}).empty());
+}
+
 TEST(PrintedRow, OfAnythingElseIsAProgrammingError) {
     EXPECT_THROW((void)PrintedRow::of(NSString::string("x")), NSInvalidArgumentException);
     EXPECT_THROW((void)PrintedRow::of(nullptr), NSInvalidArgumentException);

@@ -4,6 +4,7 @@
 #include <unicode/utf8.h>
 
 #include <cstdint>
+#include <utility>
 
 namespace orvo::DisplayText {
 
@@ -74,17 +75,20 @@ std::vector<std::string> wrap(std::string_view text, std::size_t columns) {
         std::string_view rest = text.substr(0, end);
         text = end == std::string_view::npos ? std::string_view() : text.substr(end + 1);
         std::string line;
+        std::size_t used = 0; // columns of the line
         while (!rest.empty()) {
             const std::size_t blank = rest.find(' ');
             const std::string_view word = rest.substr(0, blank);
             rest = blank == std::string_view::npos ? std::string_view() : rest.substr(blank + 1);
             if (word.empty())
                 continue;
-            if (!line.empty() && width(line) + 1 + width(word) > columns) {
-                lines.push_back(line);
-                line.clear();
+            const std::size_t wanted = width(word);
+            if (!line.empty() && used + 1 + wanted > columns) {
+                lines.push_back(std::exchange(line, {}));
+                used = 0;
             }
-            line += (line.empty() ? "" : " ") + std::string(word);
+            used += wanted + (line.empty() ? 0 : 1);
+            line.append(line.empty() ? "" : " ").append(word);
         }
         lines.push_back(line);
     }

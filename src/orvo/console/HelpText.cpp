@@ -105,9 +105,9 @@ std::string program(const ProgramSpec& program, std::size_t width) {
     std::string text = paragraph(program.summary, width);
     text += fmt::format("\nUsage: {} COMMAND [ARGUMENT]… [OPTION]…\n\nCommands:\n", program.name);
     text += definitions(entriesOf(program.commandsBelow({})), width);
-    auto options = globalOptions();
-    options.push_back({"version", "", "show the version"});
-    text += "\nOptions of every command:\n" + definitions(entriesOf(options), width);
+    text += "\nOptions of every command:\n" + definitions(entriesOf(globalOptions()), width);
+    const std::vector<OptionSpec> alone = {{"version", "", "show the version"}};
+    text += "\nOption without a command:\n" + definitions(entriesOf(alone), width);
     text += fmt::format("\n{} COMMAND --help says more, with examples.\n", program.name);
     return text + "Exit status: 0 answered, 1 could not, 2 wrong usage.\n";
 }

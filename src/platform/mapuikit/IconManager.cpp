@@ -18,8 +18,11 @@ IconManager::shieldOfArtwork(const TransitArtworkDataSource& artwork) {
 
 std::string IconManager::_nameOfArtwork(const TransitArtworkDataSource& artwork) {
     const auto shield = shieldOfArtwork(artwork);
-    const auto text = shield ? shield->shieldText().value_or("") : std::string();
-    return text.empty() ? text : "[" + text + "]";
+    if (!shield)
+        return {};
+    const auto text = shield->shieldText().value_or("");
+    const bool isShown = !text.empty() || !shield->shieldColorString().value_or("").empty();
+    return isShown ? "[" + text + "]" : "";
 }
 
 std::shared_ptr<IconManager> IconManager::sharedManager() {

@@ -20,7 +20,8 @@ public:
     /// an artwork without any.
     [[nodiscard]] static std::shared_ptr<TransitShieldDataSource>
     shieldOfArtwork(const TransitArtworkDataSource& artwork);
-    /// That shield as dumps write it, `[M1]`; empty where there is nothing to draw.
+    /// That shield as dumps write it, `[M1]`, or `[]` for a colour alone; empty where there is
+    /// nothing to draw.
     [[nodiscard]] static std::string _nameOfArtwork(const TransitArtworkDataSource& artwork);
 
     [[nodiscard]] virtual bool isCachingAtlases() const { return _cachesAtlases; }

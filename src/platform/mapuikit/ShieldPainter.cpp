@@ -8,10 +8,12 @@
 #include <QImage>
 #include <QPainter>
 #include <QPainterPath>
+#include <QTextBoundaryFinder>
 
 #include <algorithm>
 #include <array>
 #include <cmath>
+#include <optional>
 
 namespace orvo::ShieldPainter {
 
@@ -22,7 +24,8 @@ constexpr double PaddingPart = 0.3;  // of the height, each side
 constexpr double RoundedPart = 0.22; // corner radius of trams, buses and neutral shields
 constexpr double SquarePart = 0.1;   // of rail
 constexpr qsizetype DiscCharacters = 2;
-constexpr double VisibleContrast = 1.6; // between shield and card; below it a hairline helps
+constexpr qsizetype MostCharacters = 40; // no column has room for more
+constexpr double VisibleContrast = 1.6;  // between shield and card; below it a hairline helps
 
 // Laid out large and scaled down: font sizes of the toolkit are whole pixels, a path's are not.
 constexpr int LayoutPixels = 128;
@@ -59,24 +62,37 @@ double contrast(const QColor& a, const QColor& b) {
     return (lighter + 0.05) / (darker + 0.05);
 }
 
-/// `RRGGBB` or `RRGGBB,RRGGBB`; neutral for anything else.
-Colours coloursOf(const TransitShieldDataSource& shield, bool nightMode) {
+/// From `RRGGBB` or `RRGGBB,RRGGBB`; nothing for anything else.
+std::optional<Colours> ownColours(const TransitShieldDataSource& shield) {
     const auto parts = QString::fromStdString(shield.shieldColorString().value_or("")).split(',');
     const QColor background("#" + parts.first());
     if (parts.first().size() != 6 || !background.isValid())
-        return neutralColours(nightMode);
+        return std::nullopt;
     const QColor given = parts.size() > 1 ? QColor("#" + parts[1]) : QColor();
     if (given.isValid())
-        return {background, given};
-    return {background,
-            contrast(background, Qt::white) >= contrast(background, Qt::black) ? Qt::white
-                                                                               : Qt::black};
+        return Colours{background, given};
+    return Colours{background,
+                   contrast(background, Qt::white) >= contrast(background, Qt::black) ? Qt::white
+                                                                                      : Qt::black};
+}
+
+/// The text, or as much of its beginning as is whole characters and may be drawn.
+QString drawnText(const TransitShieldDataSource& shield) {
+    const auto text = QString::fromStdString(shield.shieldText().value_or(""));
+    if (text.size() <= MostCharacters)
+        return text;
+    const QString begin = text.left(MostCharacters + 1); // whether a character ends there
+    QTextBoundaryFinder characters(QTextBoundaryFinder::Grapheme, begin);
+    characters.setPosition(MostCharacters);
+    const qsizetype end =
+        characters.isAtBoundary() ? MostCharacters : characters.toPreviousBoundary();
+    return begin.left(end > 0 ? end : MostCharacters) + u'…';
 }
 
 /// The text as a shape whose capitals stand `capHeight`-centred around y = 0, from x = 0.
 struct TextShape {
-    QPainterPath path;
-    double width;
+    QPainterPath path = {};
+    double width = 0;
 };
 
 TextShape textShape(const QString& text, double height) {
@@ -129,11 +145,14 @@ double heightOf(std::int64_t shieldSize) noexcept {
 
 std::shared_ptr<UIImage>
 draw(const TransitShieldDataSource& shield, std::int64_t shieldSize, double scale, bool nightMode) {
-    const auto text = QString::fromStdString(shield.shieldText().value_or(""));
-    if (text.isEmpty() || !qobject_cast<QGuiApplication*>(QCoreApplication::instance()))
+    const auto text = drawnText(shield);
+    const auto own = ownColours(shield);
+    const bool hasLook = own || !text.isEmpty();
+    if (!hasLook || !qobject_cast<QGuiApplication*>(QCoreApplication::instance()))
         return nullptr;
+    const auto colours = own.value_or(neutralColours(nightMode));
     const double height = heightOf(shieldSize);
-    const auto shape = textShape(text, height);
+    const auto shape = text.isEmpty() ? TextShape() : textShape(text, height);
     const auto type = static_cast<TransitShieldType>(shield.shieldType());
     const bool isDisc = type == TransitShieldType::Metro && text.size() <= DiscCharacters;
     const double wanted =
@@ -146,7 +165,6 @@ draw(const TransitShieldDataSource& shield, std::int64_t shieldSize, double scal
     QPainter painter(&image);
     painter.setRenderHint(QPainter::Antialiasing);
     painter.scale(scale, scale);
-    const auto colours = coloursOf(shield, nightMode);
     const double width = columns / scale;
     const double radius = cornerRadius(type, text, width, height);
     painter.setPen(Qt::NoPen);

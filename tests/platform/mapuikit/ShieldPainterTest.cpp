@@ -7,6 +7,7 @@
 #include <QGuiApplication>
 #include <gtest/gtest.h>
 
+#include <algorithm>
 #include <cmath>
 
 namespace orvo {
@@ -149,6 +150,34 @@ TEST_F(ShieldTest, NothingToShowIsNil) {
     EXPECT_FALSE(
         SizedTransitArtwork::initWithArtwork_shieldSize_artworkCache(artwork("1"), 7, nullptr)
             ->imageToDisplayWithScreenScale_nightMode(2, false));
+}
+
+TEST_F(ShieldTest, WithoutATextIsItsLinesColourAlone) {
+    const auto image = drawn(TransitShieldDataSource::initWithFields(
+        {.shieldType = static_cast<std::int32_t>(TransitShieldType::Metro),
+         .shieldColorString = "DA291C,FFFFFF"}));
+    ASSERT_TRUE(image);
+    EXPECT_DOUBLE_EQ(image->size().width, 28);
+    EXPECT_EQ(pixel(*image, 14, 14), 0xFFDA291CU);
+    EXPECT_FALSE(drawn(TransitShieldDataSource::initWithFields({.shieldColorString = "red"})));
+}
+
+TEST_F(ShieldTest, OfATextThatNoColumnHasRoomForTheBeginningIsDrawn) {
+    const std::string forty(40, 'W');
+    const auto whole = drawn(shield(forty.c_str()));
+    const auto cut = drawn(shield((forty + "W").c_str()));
+    EXPECT_GT(cut->size().width, whole->size().width); // an ellipsis follows
+    const auto longest = drawn(shield(std::string(100'000, 'W').c_str()));
+    EXPECT_EQ(longest->size().width, cut->size().width);
+    EXPECT_TRUE(std::ranges::equal(longest->pixels(), cut->pixels()));
+}
+
+TEST_F(ShieldTest, ALongTextIsCutBetweenWholeCharacters) {
+    const std::string before(39, 'W');
+    const std::string flag = "\U0001F1E9\U0001F1EA"; // two code points, four units of UTF-16
+    const auto cut = drawn(shield((before + flag + "W").c_str()));
+    const auto expected = drawn(shield((before + "…").c_str()));
+    EXPECT_TRUE(std::ranges::equal(cut->pixels(), expected->pixels()));
 }
 
 TEST_F(ShieldTest, ArtworkWithoutAShieldShowsItsFallbackOrText) {

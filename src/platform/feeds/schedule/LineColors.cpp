@@ -1,5 +1,7 @@
 #include "platform/feeds/schedule/LineColors.h"
 
+#include "platform/feeds/schedule/ScheduleText.h"
+
 #include <algorithm>
 #include <charconv>
 #include <cmath>
@@ -31,8 +33,10 @@ double contrastRatio(std::string_view a, std::string_view b) {
 }
 
 LineColors LineColors::mended(std::string_view background, std::string_view text) {
-    LineColors colors{std::string(background.empty() ? White : background), std::string(text)};
-    if (text.empty() || contrastRatio(colors.background, text) < LeastContrast)
+    LineColors colors{ScheduleText::color(background), ScheduleText::color(text)};
+    if (colors.background.empty())
+        colors.background = White;
+    if (colors.text.empty() || contrastRatio(colors.background, colors.text) < LeastContrast)
         colors.text =
             contrastRatio(colors.background, White) >= contrastRatio(colors.background, Black)
                 ? White

@@ -13,9 +13,10 @@ struct LineColors {
     std::string background; ///< `RRGGBB` in capitals
     std::string text;       ///< likewise
 
-    /// Colours that can be read from those that a schedule gives (`RRGGBB` or empty): a missing
-    /// background is white, as a missing route_color means; a text colour that is missing or too
-    /// close to the background is black or white, whichever is further from it.
+    /// Colours that can be read from those that a schedule gives (`RRGGBB`; whatever else it is
+    /// counts as missing): a missing background is white, as a missing route_color means; a text
+    /// colour that is missing or too close to the background is black or white, whichever is
+    /// further from it.
     [[nodiscard]] static LineColors mended(std::string_view background, std::string_view text);
 
     /// Background and text as a shield's colour string: `RRGGBB,RRGGBB`.

@@ -103,6 +103,21 @@ struct ScheduleStore::Implementation {
         return Result{};
     }
 
+    /// What `find` finds among all lines by their names in the person's language. Where that is
+    /// nothing, by those that the schedules themselves have: a sign may show them.
+    template <class Find>
+    std::vector<ScheduleLine> found(const Find& find, std::shared_ptr<NSError>* error) const {
+        const std::string locale = Text::locale().get();
+        LineSearch search(locale);
+        return answer<std::vector<ScheduleLine>>(
+            [&](ScheduleQueries& reading) {
+                auto lines = find(search, reading.translated(reading.allLines(), locale));
+                return lines.empty() ? reading.translated(find(search, reading.allLines()), locale)
+                                     : lines;
+            },
+            error);
+    }
+
     std::shared_ptr<NSError> change(const std::function<void(ScheduleWriter&)>& write);
     std::shared_ptr<NSError> changeInMemory(const std::function<void(ScheduleWriter&)>& write);
     std::shared_ptr<NSError> changeAsOne(SQLiteDatabase& changed,
@@ -242,24 +257,20 @@ std::shared_ptr<const LineIndex> ScheduleStore::lineIndex(std::string_view feed,
 std::vector<ScheduleLine> ScheduleStore::search(std::string_view text,
                                                 std::size_t limit,
                                                 std::shared_ptr<NSError>* error) const {
-    const std::string locale = Text::locale().get();
-    auto lines = _implementation->answer<std::vector<ScheduleLine>>(
-        [&locale](ScheduleQueries& queries) {
-            return queries.translated(queries.allLines(), locale);
+    return _implementation->found(
+        [&](LineSearch& search, std::vector<ScheduleLine> lines) {
+            return search.best(std::move(lines), text, limit);
         },
         error);
-    return LineSearch(locale).best(std::move(lines), text, limit);
 }
 
 std::vector<ScheduleLine> ScheduleStore::linesNamed(std::string_view name,
                                                     std::shared_ptr<NSError>* error) const {
-    const std::string locale = Text::locale().get();
-    auto lines = _implementation->answer<std::vector<ScheduleLine>>(
-        [&locale](ScheduleQueries& queries) {
-            return queries.translated(queries.allLines(), locale);
+    return _implementation->found(
+        [&](LineSearch& search, std::vector<ScheduleLine> lines) {
+            return search.named(std::move(lines), name);
         },
         error);
-    return LineSearch(locale).named(std::move(lines), name);
 }
 
 std::shared_ptr<NSError> ScheduleStore::importSchedule(const std::string& feed,

@@ -60,12 +60,12 @@ public:
     /// agency's name, best first: the very short name, the very long name, the beginning of the
     /// short name, beginnings of words of the names, of the agency too, then any place; then by
     /// feed and in the schedule's order. Case and accents do not count. Empty for a text without
-    /// words.
+    /// words. Names are those in the person's language; where none fits, the schedule's own.
     [[nodiscard]] std::vector<ScheduleLine> search(std::string_view text,
                                                    std::size_t limit,
                                                    std::shared_ptr<NSError>* error = nullptr) const;
-    /// The lines whose short or long name is `name`, by feed and in the schedule's order. Case and
-    /// accents do not count.
+    /// The lines whose short or long name is `name`, by feed and in the schedule's order, as
+    /// `search` compares them.
     [[nodiscard]] std::vector<ScheduleLine>
     linesNamed(std::string_view name, std::shared_ptr<NSError>* error = nullptr) const;
 

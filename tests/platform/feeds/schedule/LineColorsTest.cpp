@@ -35,6 +35,13 @@ TEST(LineColors, MissingColorsAreMended) {
     EXPECT_EQ(LineColors::mended("", "00008B").shieldColorString(), "FFFFFF,00008B");
 }
 
+TEST(LineColors, WhatIsNoColorCountsAsMissing) {
+    for (const char* none : {"-1", "x", "DA291", "DA291C0", "GG0000", "\xFF\x00\xFE"}) {
+        EXPECT_EQ(LineColors::mended(none, none).shieldColorString(), "FFFFFF,000000") << none;
+        EXPECT_EQ(LineColors::mended("DA291C", none).shieldColorString(), "DA291C,FFFFFF") << none;
+    }
+}
+
 TEST(LineColors, EveryGreyIsReadableOnceMended) {
     for (int level = 0; level < 256; ++level) {
         const std::string grey = fmt::format("{0:02X}{0:02X}{0:02X}", level);

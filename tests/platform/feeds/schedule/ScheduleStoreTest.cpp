@@ -362,6 +362,11 @@ TEST_F(ScheduleStoreTest, AnswersNamesInThePersonsLanguage) {
     EXPECT_EQ(store->lines("city")[0].longName, "Station - Town hall");
     EXPECT_EQ(store->line(lineMuid("city", "R2"))->agency.name, "City Transit");
     EXPECT_THAT(routesOf(store->search("town", 5)), ElementsAre("R1"));
+    // A sign may show the name that the schedule itself has.
+    const auto bySign = store->search("mairie", 5);
+    ASSERT_THAT(routesOf(bySign), ElementsAre("R1"));
+    EXPECT_EQ(bySign[0].longName, "Station - Town hall");
+    EXPECT_THAT(routesOf(store->linesNamed("gare mairie")), ElementsAre("R1"));
     EXPECT_EQ(store->lineIndex("city")->lines()[0].longName, "Gare - Mairie");
     ASSERT_EQ(import(testing::smallSchedule()), "");
     EXPECT_EQ(store->lines("city")[0].longName, "Gare - Mairie");
