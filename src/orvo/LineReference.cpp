@@ -59,7 +59,7 @@ Answer resolve(const ScheduleStore& schedules, const std::string& text) {
     if (lines.size() > 1)
         return ambiguous(text, lines);
     if (feeds.empty())
-        return {std::nullopt, "there are no feeds yet", "Add one with: orvo feeds add"};
+        return {std::nullopt, "there is no schedule yet", NoScheduleCure};
     return {std::nullopt,
             fmt::format("no line is called {}", text),
             colon == std::string::npos

@@ -17,6 +17,10 @@ struct Answer {
 
 [[nodiscard]] Answer resolve(const ScheduleStore& schedules, const std::string& text);
 
+/// What to do where no feed has a schedule, a sentence.
+inline constexpr const char* NoScheduleCure =
+    "Add a feed with: orvo feeds add. For those that you have: orvo feeds update";
+
 /// `FEED:ROUTE_ID` of a line.
 [[nodiscard]] std::string nameOf(std::string_view feed, std::string_view routeId);
 

@@ -146,7 +146,7 @@ ExitCode LinesCommand::run(const Arguments& arguments, CommandContext& context) 
     if (error)
         return context.fail(*error);
     if (!hasFeeds)
-        return context.fail("there are no feeds yet", "Add one with: orvo feeds add");
+        return context.fail("there is no schedule yet", LineReference::NoScheduleCure);
     TextTable table({{"Line", TextTable::Column::Alignment::Left, false},
                      {"Short", TextTable::Column::Alignment::Left, false},
                      {"Name"},

@@ -83,6 +83,7 @@ std::vector<Group> of(const IncidentReport& report,
             same->lines.push_back(unknown.lines.front());
     }
     std::vector<Group> groups;
+    groups.reserve(all.size());
     for (const auto& unknown : all)
         groups.push_back({messageOf(unknown), unknown.cure});
     return groups;

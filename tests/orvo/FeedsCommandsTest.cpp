@@ -279,7 +279,7 @@ TEST_F(FeedsCommandsTest, RemoveForgetsTheScheduleToo) {
     addCity();
     EXPECT_EQ(answered({"feeds", "remove", "city"}), "Removed city\n");
     EXPECT_EQ(answered({"feeds", "list"}), "");
-    EXPECT_THAT(refused({"lines", "M1"}), HasSubstr("there are no feeds yet"));
+    EXPECT_THAT(refused({"lines", "M1"}), HasSubstr("there is no schedule yet"));
 }
 
 TEST_F(FeedsCommandsTest, LinesThatCannotBeReadAreAFailureAndNotNone) {

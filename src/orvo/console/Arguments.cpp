@@ -161,6 +161,7 @@ private:
                                            const std::vector<const OptionSpec*>& found) const {
         if (found.size() > 1) {
             std::vector<std::string> names;
+            names.reserve(found.size());
             for (const auto* option : found)
                 names.push_back("--" + option->name);
             return {fmt::format("{} may mean several options", given),

@@ -60,8 +60,8 @@ std::string zshCommandChoice(const ProgramSpec& program) {
         const std::string before = fmt::format("{}", fmt::join(group, " "));
         for (const auto& [word, explanation] : wordsAfter(program, group))
             text += fmt::format("        {}) place={}; ((taken++)) ;;\n",
-                                quoted(before + "/" + word),
-                                quoted(before.empty() ? word : before + " " + word));
+                                quoted(fmt::format("{}/{}", before, word)),
+                                quoted(before.empty() ? word : fmt::format("{} {}", before, word)));
     }
     text += "        esac\n    done\n    case $place in\n";
     for (const auto& group : groups) {

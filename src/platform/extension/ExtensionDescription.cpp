@@ -2,10 +2,12 @@
 
 #include "platform/foundation/StringsTable.h"
 
+#include <array>
 #include <cerrno>
 #include <cstring>
 #include <fstream>
 #include <iterator>
+#include <utility>
 
 namespace orvo {
 
@@ -47,11 +49,11 @@ std::optional<ExtensionDescription> ExtensionDescription::read(const std::filesy
         return fail(ExtensionErrorCode::WrongDescription, problem);
 
     ExtensionDescription description;
-    const std::pair<const char*, std::string*> needed[] = {
-        {"BundleIdentifier", &description.bundleIdentifier},
-        {"ContainingApplication", &description.containingApplication},
-        {"DisplayName", &description.displayName},
-        {"NSExtensionPrincipalClass", &description.principalClass}};
+    const auto needed = std::to_array<std::pair<const char*, std::string*>>(
+        {{"BundleIdentifier", &description.bundleIdentifier},
+         {"ContainingApplication", &description.containingApplication},
+         {"DisplayName", &description.displayName},
+         {"NSExtensionPrincipalClass", &description.principalClass}});
     for (const auto& [key, target] : needed) {
         *target = entries->text(key).value_or("");
         if (target->empty())

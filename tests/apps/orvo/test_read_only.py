@@ -76,7 +76,7 @@ class ReadOnly(ProgramTest):
     def test_an_empty_home_is_one_without_favourites(self):
         self.assertIn("orvo favorites add", self.run_without_rights("incidents").err)
         self.assertIn("orvo feeds add", self.run_without_rights("feeds", "list").err)
-        self.assertIn("no feeds yet", self.run_without_rights("lines", "ferry").err)
+        self.assertIn("no schedule yet", self.run_without_rights("lines", "ferry").err)
 
     def test_the_demonstration_can_be_looked_at(self):
         answer = self.run_without_rights("incidents", "--demo")

@@ -17,7 +17,7 @@ namespace orvo {
 namespace {
 
 constexpr const char* FeedPath = "/alerts.pb";
-constexpr qsizetype LongestRequest = 16 * 1024;
+constexpr qsizetype LongestRequest = qsizetype{16} * 1024;
 
 struct Request {
     std::string line; ///< `GET /alerts.pb`

@@ -115,7 +115,7 @@ public:
 
 private:
     static constexpr std::size_t CacheLine = 64;
-    static constexpr std::size_t Distance = 8 * 1024;
+    static constexpr std::size_t Distance = std::size_t{8} * 1024;
 
     std::string_view _message;
     std::size_t _asked = 0;

@@ -47,7 +47,7 @@ namespace AlertReader {
 /// `visit` is called with each entity as it is met, while its bytes are at hand, and may be empty;
 /// what it learnt counts only when a message is answered.
 [[nodiscard]] std::optional<AlertMessage>
-read(std::span<const std::uint8_t> bytes,
+read(std::span<const std::uint8_t> data,
      std::shared_ptr<NSError>* error,
      const std::function<void(std::string_view entity)>& visit = {});
 
