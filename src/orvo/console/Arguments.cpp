@@ -79,7 +79,7 @@ public:
                 if (auto error = readOption(word))
                     return error;
             } else {
-                operands.push_back(word);
+                _operands.push_back(word);
             }
         }
         if (isGiven("help"))
@@ -94,8 +94,10 @@ public:
         return std::nullopt;
     }
 
-    std::vector<std::pair<std::string, std::string>> options;
-    std::vector<std::string> operands;
+    /// Options with their values, in the order in which they were given.
+    using Given = std::vector<std::pair<std::string, std::string>>;
+    [[nodiscard]] const Given& given() const noexcept { return _given; }
+    [[nodiscard]] const std::vector<std::string>& operands() const noexcept { return _operands; }
 
 private:
     /// A program of one command has no word for it.
@@ -104,7 +106,7 @@ private:
     }
 
     [[nodiscard]] bool isGiven(std::string_view name) const {
-        return std::ranges::any_of(options, [&](const auto& given) { return given.first == name; });
+        return std::ranges::any_of(_given, [&](const auto& one) { return one.first == name; });
     }
 
     std::optional<UsageError> readOption(const std::string& word) {
@@ -120,7 +122,7 @@ private:
         if (option.value.empty()) {
             if (equals != std::string::npos)
                 return UsageError{fmt::format("--{} takes no value", option.name), ""};
-            options.emplace_back(option.name, "");
+            _given.emplace_back(option.name, "");
             return std::nullopt;
         }
         if (equals != std::string::npos)
@@ -141,7 +143,7 @@ private:
                               fmt::format("Choose one of {}.", fmt::join(option.words, ", "))};
         if (isGiven(option.name) && !option.takesSeveral)
             return UsageError{fmt::format("--{} is given twice", option.name), ""};
-        options.emplace_back(option.name, value);
+        _given.emplace_back(option.name, value);
         return std::nullopt;
     }
 
@@ -187,18 +189,18 @@ private:
                         operand.count == OperandSpec::Count::Any;
         }
         const std::string cure = fmt::format("Usage: {}", withProgram(_command.usage()));
-        if (operands.size() < least)
-            return UsageError{fmt::format("{} is missing", _command.operands[operands.size()].name),
-                              cure};
-        if (!unlimited && operands.size() > _command.operands.size())
+        if (_operands.size() < least)
             return UsageError{
-                fmt::format("\"{}\" is one word too many", operands[_command.operands.size()]),
+                fmt::format("{} is missing", _command.operands[_operands.size()].name), cure};
+        if (!unlimited && _operands.size() > _command.operands.size())
+            return UsageError{
+                fmt::format("\"{}\" is one word too many", _operands[_command.operands.size()]),
                 cure};
-        for (std::size_t i = 0; i < std::min(operands.size(), _command.operands.size()); ++i) {
+        for (std::size_t i = 0; i < std::min(_operands.size(), _command.operands.size()); ++i) {
             const auto& operand = _command.operands[i];
             if (operand.completes == Completes::Word && !operand.words.empty() &&
-                std::ranges::count(operand.words, operands[i]) == 0)
-                return UsageError{fmt::format("{} cannot be \"{}\"", operand.name, operands[i]),
+                std::ranges::count(operand.words, _operands[i]) == 0)
+                return UsageError{fmt::format("{} cannot be \"{}\"", operand.name, _operands[i]),
                                   fmt::format("Choose one of {}.", fmt::join(operand.words, ", "))};
         }
         return std::nullopt;
@@ -208,6 +210,8 @@ private:
     const std::string& _program;
     const std::vector<std::string>& _words;
     std::vector<OptionSpec> _options;
+    Given _given;
+    std::vector<std::string> _operands;
     std::size_t _next = 0;
 };
 
@@ -219,9 +223,9 @@ ArgumentParser::parse(const std::vector<std::string>& words) const {
     if (auto error = reading.read())
         return *error;
     Arguments arguments;
-    for (auto& [name, value] : reading.options)
+    for (const auto& [name, value] : reading.given())
         arguments._options.emplace(name, value);
-    arguments._operands = reading.operands;
+    arguments._operands = reading.operands();
     return arguments;
 }
 
