@@ -9,7 +9,6 @@ namespace orvo {
 namespace {
 
 using ::testing::HasSubstr;
-using ::testing::Not;
 
 class FeedsCommandsTest : public testing::CommandTest {};
 
@@ -181,7 +180,7 @@ TEST_F(FeedsCommandsTest, OneIsNoPlural) {
     writeSchedule();
     write("schedule/agency.txt",
           "agency_id,agency_name,agency_url,agency_timezone\nmbt,M,https://m.example,UTC\n");
-    const auto routes = "route_id,agency_id,route_short_name,route_type\nM1,mbt,M1,1\n";
+    const auto* const routes = "route_id,agency_id,route_short_name,route_type\nM1,mbt,M1,1\n";
     const auto schedule = write("schedule/routes.txt", routes);
     EXPECT_EQ(answered({"feeds",
                         "add",

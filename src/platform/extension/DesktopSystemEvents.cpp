@@ -49,7 +49,7 @@ public:
 
 private Q_SLOTS:
     void sessionChanged() { askLock(); }
-    void preparingForSleep(bool begins) const {
+    void preparingForSleep(bool begins) {
         if (!begins && _handlers.machineDidWake)
             _handlers.machineDidWake();
     }

@@ -78,7 +78,7 @@ std::optional<Colours> ownColours(const TransitShieldDataSource& shield) {
 
 /// The text, or as much of its beginning as is whole characters and may be drawn.
 QString drawnText(const TransitShieldDataSource& shield) {
-    const auto text = QString::fromStdString(shield.shieldText().value_or(""));
+    auto text = QString::fromStdString(shield.shieldText().value_or(""));
     if (text.size() <= MostCharacters)
         return text;
     const QString begin = text.left(MostCharacters + 1); // whether a character ends there

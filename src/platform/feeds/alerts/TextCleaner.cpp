@@ -112,7 +112,8 @@ bool isPlain(std::string_view text) {
     if (text.front() == ' ' || text.back() == ' ')
         return false;
     if (text.size() <= ByteScan::Block)
-        return std::ranges::all_of(text, isPlainCharacter) && text.find("  ") == text.npos;
+        return std::ranges::all_of(text, isPlainCharacter) &&
+               text.find("  ") == std::string_view::npos;
     const char* const last = text.data() + text.size() - ByteScan::Block - 1;
     for (const char* block = text.data(); block < last; block += ByteScan::Block)
         if (!ByteScan::isPlainText(block))
