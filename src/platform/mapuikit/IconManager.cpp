@@ -18,11 +18,8 @@ IconManager::shieldOfArtwork(const TransitArtworkDataSource& artwork) {
 
 std::string IconManager::_nameOfArtwork(const TransitArtworkDataSource& artwork) {
     const auto shield = shieldOfArtwork(artwork);
-    if (!shield)
-        return {};
-    const auto text = shield->shieldText().value_or("");
-    const bool isShown = !text.empty() || !shield->shieldColorString().value_or("").empty();
-    return isShown ? "[" + text + "]" : "";
+    const bool isVisible = shield && ShieldPainter::isVisible(*shield);
+    return isVisible ? "[" + shield->shieldText().value_or("") + "]" : "";
 }
 
 std::shared_ptr<IconManager> IconManager::sharedManager() {

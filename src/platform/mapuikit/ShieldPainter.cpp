@@ -143,14 +143,16 @@ double heightOf(std::int64_t shieldSize) noexcept {
     return Heights.at(static_cast<std::size_t>(std::clamp(shieldSize, std::int64_t{0}, Largest)));
 }
 
+bool isVisible(const TransitShieldDataSource& shield) {
+    return !shield.shieldText().value_or("").empty() || ownColours(shield);
+}
+
 std::shared_ptr<UIImage>
 draw(const TransitShieldDataSource& shield, std::int64_t shieldSize, double scale, bool nightMode) {
-    const auto text = drawnText(shield);
-    const auto own = ownColours(shield);
-    const bool hasLook = own || !text.isEmpty();
-    if (!hasLook || !qobject_cast<QGuiApplication*>(QCoreApplication::instance()))
+    if (!isVisible(shield) || !qobject_cast<QGuiApplication*>(QCoreApplication::instance()))
         return nullptr;
-    const auto colours = own.value_or(neutralColours(nightMode));
+    const auto text = drawnText(shield);
+    const auto colours = ownColours(shield).value_or(neutralColours(nightMode));
     const double height = heightOf(shieldSize);
     const auto shape = text.isEmpty() ? TextShape() : textShape(text, height);
     const auto type = static_cast<TransitShieldType>(shield.shieldType());

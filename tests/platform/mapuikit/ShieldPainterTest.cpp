@@ -162,6 +162,20 @@ TEST_F(ShieldTest, WithoutATextIsItsLinesColourAlone) {
     EXPECT_FALSE(drawn(TransitShieldDataSource::initWithFields({.shieldColorString = "red"})));
 }
 
+TEST(IconManager, NamesWhatIsDrawn) {
+    const auto name = [](std::optional<std::string> text, std::optional<std::string> colours) {
+        return IconManager::_nameOfArtwork(*TransitArtworkDataSource::initWithFields(
+            {.shieldDataSource = TransitShieldDataSource::initWithFields(
+                 {.shieldText = std::move(text), .shieldColorString = std::move(colours)})}));
+    };
+    EXPECT_EQ(name("M1", "DA291C,FFFFFF"), "[M1]");
+    EXPECT_EQ(name("M1", std::nullopt), "[M1]");
+    EXPECT_EQ(name(std::nullopt, "DA291C,FFFFFF"), "[]");
+    EXPECT_EQ(name(std::nullopt, "red"), "");
+    EXPECT_EQ(name("", std::nullopt), "");
+    EXPECT_EQ(IconManager::_nameOfArtwork(*TransitArtworkDataSource::initWithFields({})), "");
+}
+
 TEST_F(ShieldTest, OfATextThatNoColumnHasRoomForTheBeginningIsDrawn) {
     const std::string forty(40, 'W');
     const auto whole = drawn(shield(forty.c_str()));

@@ -107,14 +107,22 @@ struct ScheduleStore::Implementation {
     /// nothing, by those that the schedules themselves have: a sign may show them.
     template <class Find>
     std::vector<ScheduleLine> found(const Find& find, std::shared_ptr<NSError>* error) const {
+        using Lines = std::vector<ScheduleLine>;
         const std::string locale = Text::locale().get();
-        LineSearch search(locale);
-        return answer<std::vector<ScheduleLine>>(
+        LineSearch search(locale); // others need not wait for it
+        Lines own;
+        Lines lines = answer<Lines>(
             [&](ScheduleQueries& reading) {
-                auto lines = find(search, reading.translated(reading.allLines(), locale));
-                return lines.empty() ? reading.translated(find(search, reading.allLines()), locale)
-                                     : lines;
+                own = reading.allLines();
+                return reading.translated(own, locale);
             },
+            error);
+        lines = find(search, std::move(lines));
+        if (!lines.empty())
+            return lines;
+        own = find(search, std::move(own));
+        return answer<Lines>(
+            [&](ScheduleQueries& reading) { return reading.translated(std::move(own), locale); },
             error);
     }
 
