@@ -38,6 +38,12 @@ TEST(DisplayText, KeepsLineBreaksAndLongWords) {
               (Lines{"see", "https://example.org/long", "now"}));
 }
 
+TEST(DisplayText, EveryLineOfALongTextIsFilled) {
+    EXPECT_EQ(DisplayText::wrap("aa bb cc dd ee ff g", 5),
+              (std::vector<std::string>{"aa bb", "cc dd", "ee ff", "g"}));
+    EXPECT_EQ(DisplayText::wrap("漢字 漢字 a", 6), (std::vector<std::string>{"漢字", "漢字 a"}));
+}
+
 TEST(DisplayText, OneLineHasNoControlCharacters) {
     EXPECT_EQ(DisplayText::oneLine(" a\n\t b\x1b[31mc "), "a b [31mc");
     EXPECT_EQ(DisplayText::oneLine("a\u2028b"), "a b");
