@@ -1,5 +1,8 @@
 #pragma once
 
+#include <algorithm>
+#include <array>
+#include <cstddef>
 #include <cstdint>
 #include <string_view>
 
@@ -18,6 +21,29 @@ stableHash(std::string_view bytes, std::uint64_t seed = 0xcbf29ce484222325ULL) n
         hash *= 0x100000001b3ULL;
     }
     return hash;
+}
+
+/// So many hashes are worked out in about the time of one.
+inline constexpr std::size_t HashLanes = 4;
+
+/// `stableHash` of four texts, of which each continues its own earlier hash. One step of a hash has
+/// to wait for the step before; those of the others are done meanwhile.
+[[nodiscard]] constexpr std::array<std::uint64_t, HashLanes>
+stableHashes(const std::array<std::string_view, HashLanes>& texts,
+             const std::array<std::uint64_t, HashLanes>& seeds) noexcept {
+    const std::size_t common =
+        std::min({texts[0].size(), texts[1].size(), texts[2].size(), texts[3].size()});
+    auto [a, b, c, d] = seeds;
+    for (std::size_t i = 0; i < common; ++i) {
+        a = stableHash(texts[0].substr(i, 1), a);
+        b = stableHash(texts[1].substr(i, 1), b);
+        c = stableHash(texts[2].substr(i, 1), c);
+        d = stableHash(texts[3].substr(i, 1), d);
+    }
+    return {stableHash(texts[0].substr(common), a),
+            stableHash(texts[1].substr(common), b),
+            stableHash(texts[2].substr(common), c),
+            stableHash(texts[3].substr(common), d)};
 }
 
 /// The hash of a number with a fraction. With a = |value| and r = a rounded half up: the fraction a

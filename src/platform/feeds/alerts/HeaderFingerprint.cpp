@@ -1,7 +1,7 @@
 #include "platform/feeds/alerts/HeaderFingerprint.h"
 
 #include "platform/feeds/alerts/ByteScan.h"
-#include "platform/feeds/alerts/IncidentMerger.h"
+#include "platform/feeds/alerts/IncidentContent.h"
 
 #include <algorithm>
 #include <string>
@@ -38,14 +38,15 @@ std::string_view beginningOf(std::string_view text) {
 std::uint64_t headerFingerprint(std::string_view text) {
     if (beginsPlainly(text))
         return hashOf(text);
+    std::string room;
     const std::string_view begin = beginningOf(text);
     if (begin.find_first_of("<&") == std::string_view::npos) {
         // A blank at the cut is dropped here, but not in the middle of the whole text.
-        const std::string normalised = IncidentMerger::normalised(begin);
+        const std::string_view normalised = IncidentContent::normalised(begin, room);
         if (normalised.size() >= Counted)
             return hashOf(normalised);
     }
-    return hashOf(IncidentMerger::normalised(text));
+    return hashOf(IncidentContent::normalised(text, room));
 }
 
 } // namespace orvo

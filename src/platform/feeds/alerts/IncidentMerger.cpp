@@ -1,9 +1,5 @@
 #include "platform/feeds/alerts/IncidentMerger.h"
 
-#include "platform/feeds/alerts/ByteScan.h"
-#include "platform/feeds/alerts/TextCleaner.h"
-#include "platform/foundation/Hashing.h"
-
 #include <algorithm>
 #include <tuple>
 #include <utility>
@@ -16,9 +12,6 @@ namespace {
 constexpr std::size_t MostUnderOneId = 16;
 /// No incident is told in more; each is compared with each.
 constexpr std::size_t MostLanguages = 100;
-
-constexpr std::string_view NoBreakSpace = "\u00A0";
-constexpr std::string_view NarrowNoBreakSpace = "\u202F";
 
 bool hasTag(const std::vector<AlertText>& texts, std::string_view tag) {
     return std::any_of(texts.begin(), texts.end(), [&](const AlertText& text) {
@@ -100,63 +93,32 @@ std::vector<Incident> IncidentMerger::take() {
 }
 
 void IncidentMerger::mergeSameContent() {
-    std::vector<Incident> merged;
-    std::vector<std::string> contents;
-    SeededNumberMap<std::size_t> positions;
-    merged.reserve(_incidents.size());
+    std::vector<IncidentContent> contents;
     contents.reserve(_incidents.size());
-    positions.reserve(_incidents.size());
-    for (Incident& incident : _incidents) {
-        std::string content = contentOf(incident);
-        std::uint64_t muid = stableHash(content);
-        auto [found, isNew] = positions.try_emplace(muid, merged.size());
+    for (const Incident& incident : _incidents)
+        contents.push_back(contentOf(incident));
+    const std::vector<std::uint64_t> numbers = IncidentContent::numbersOf(contents, _feed);
+    SeededNumberMap<std::size_t> firsts; // the first incident of each number
+    firsts.reserve(_incidents.size());
+    for (std::size_t i = 0; i < _incidents.size(); ++i) {
+        std::uint64_t muid = numbers[i];
+        auto [found, isNew] = firsts.try_emplace(muid, i);
         // Two contents of one hash would hide one another: the later takes the next free number.
-        while (muid == 0 || (!isNew && contents[found->second] != content))
-            std::tie(found, isNew) = positions.try_emplace(++muid, merged.size());
-        if (!isNew) {
-            unite(merged[found->second], incident);
-            continue;
-        }
-        incident.muid = muid;
-        merged.push_back(std::move(incident));
-        contents.push_back(std::move(content));
+        while (muid == 0 || (!isNew && !contents[found->second].isSameAs(contents[i])))
+            std::tie(found, isNew) = firsts.try_emplace(++muid, i);
+        if (isNew)
+            _incidents[i].muid = muid;
+        else
+            unite(_incidents[found->second], _incidents[i]);
     }
-    _incidents = std::move(merged);
+    std::erase_if(_incidents, [](const Incident& incident) { return incident.muid == 0; });
 }
 
-std::string IncidentMerger::contentOf(const Incident& incident) const {
+IncidentContent IncidentMerger::contentOf(const Incident& incident) const {
     const auto [header, description] = _preference.bestPair(incident.header, incident.description);
-    constexpr std::size_t Separators = 8;
-    std::string content;
-    content.reserve(_feed.size() + (header ? header->text.size() : 0) +
-                    (description ? description->text.size() : 0) + Separators);
-    content += _feed;
-    content += '\0';
-    if (header)
-        content += normalised(header->text);
-    content += '\0';
-    if (description)
-        content += normalised(description->text);
-    content += '\0';
-    content += std::to_string(incident.effect);
-    return content;
-}
-
-std::string IncidentMerger::normalised(std::string_view text) {
-    std::string line = TextCleaner::cleanLine(text);
-    if (ByteScan::isASCII(line))
-        return line;
-    std::string plain;
-    plain.reserve(line.size());
-    for (std::string_view rest = line; !rest.empty();) {
-        std::size_t length = 1;
-        for (const std::string_view blank : {NoBreakSpace, NarrowNoBreakSpace})
-            if (rest.starts_with(blank))
-                length = blank.size();
-        plain += length == 1 ? rest[0] : ' ';
-        rest.remove_prefix(length);
-    }
-    return plain;
+    return {header ? header->text : std::string_view(),
+            description ? description->text : std::string_view(),
+            incident.effect};
 }
 
 } // namespace orvo

@@ -1,6 +1,7 @@
 #pragma once
 
 #include "platform/feeds/alerts/Incident.h"
+#include "platform/feeds/alerts/IncidentContent.h"
 #include "platform/feeds/alerts/LanguagePreference.h"
 #include "platform/foundation/SeededStringHash.h"
 
@@ -28,12 +29,9 @@ public:
     /// The incidents, in the order in which their first alerts were added. Ends the merger.
     [[nodiscard]] std::vector<Incident> take();
 
-    /// A text as it is compared: clean, on one line, with plain blanks only.
-    [[nodiscard]] static std::string normalised(std::string_view text);
-
 private:
     [[nodiscard]] Incident* translationPartner(const Alert& alert, std::size_t source);
-    [[nodiscard]] std::string contentOf(const Incident& incident) const;
+    [[nodiscard]] IncidentContent contentOf(const Incident& incident) const;
     void mergeSameContent();
 
     std::string _feed;

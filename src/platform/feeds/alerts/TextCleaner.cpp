@@ -170,6 +170,11 @@ std::string cleanLine(std::string_view text) {
     return isPlain(text) ? std::string(text) : onOneLine(clean(text));
 }
 
+std::string_view cleanLine(std::string_view text, std::string& room) {
+    text = trimmed(text);
+    return isPlain(text) ? text : room = onOneLine(clean(text));
+}
+
 std::string onOneLine(std::string_view cleanText) {
     if (isPlain(cleanText))
         return std::string(cleanText);

@@ -22,6 +22,9 @@ inline constexpr std::size_t LongestPublished = std::size_t{1} << 20U;
 
 /// `clean` and then `onOneLine`.
 [[nodiscard]] std::string cleanLine(std::string_view text);
+/// The same without a copy where nothing is to be cleaned: views `text`, or `room`, which is
+/// written then.
+[[nodiscard]] std::string_view cleanLine(std::string_view text, std::string& room);
 
 /// A clean text with each run of blanks and line breaks as one blank.
 [[nodiscard]] std::string onOneLine(std::string_view cleanText);

@@ -2,6 +2,7 @@
 
 #include "CapturedFeed.h"
 #include "platform/feeds/alerts/EntityReader.h"
+#include "platform/feeds/alerts/TextCleaner.h"
 
 #include <gtest/gtest.h>
 
@@ -132,8 +133,20 @@ TEST(IncidentMerger, TheNumberIsTheSameEverywhereAndAnotherInAnotherFeed) {
     EXPECT_NE(muid(one, "en", "town"), muid(one, "en", "city"));
 }
 
-TEST(IncidentMerger, NormalisesAcrossLongTexts) {
-    EXPECT_EQ(IncidentMerger::normalised("a\u202Fb\u00A0c &eacute;"), "a b c é");
+TEST(IncidentMerger, RepeatsAreFoundAmongManyAndKeepTheFirstOnesPlace) {
+    std::deque<std::string> headers;
+    std::deque<Alert> alerts;
+    for (int i = 0; i < 30; ++i) {
+        headers.push_back("Delay on line " + std::to_string(i % 10));
+        alerts.push_back(alert(std::to_string(i), {{headers.back(), "en"}}));
+    }
+    alerts[17].header[0].text = "<i>Delay on line&nbsp;7</i>";
+    const auto incidents = merge(alerts);
+    ASSERT_EQ(incidents.size(), 10U);
+    for (std::size_t i = 0; i < incidents.size(); ++i) {
+        EXPECT_EQ(incidents[i].header.at(0).text, headers[i]);
+        EXPECT_EQ(incidents[i].members.size(), 3U);
+    }
 }
 
 TEST(IncidentMerger, ThreeEntitiesOfThreeLanguagesUnderOneIdentifierAreOneIncident) {
@@ -166,7 +179,7 @@ TEST(IncidentMerger, ThreeEntitiesOfThreeLanguagesUnderOneIdentifierAreOneIncide
         const auto preference = LanguagePreference::forPerson("fr-BE", "nl");
         std::vector<std::string> titles;
         for (const Incident& incident : incidents)
-            titles.push_back(IncidentMerger::normalised(preference.best(incident.header)->text));
+            titles.push_back(TextCleaner::cleanLine(preference.best(incident.header)->text));
         EXPECT_EQ(titles, french) << name;
     }
 }
