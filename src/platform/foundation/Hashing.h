@@ -12,14 +12,17 @@ namespace orvo {
 /// system.
 inline constexpr std::uint64_t HashMultiplier = 2654435761U;
 
+/// One step of `stableHash`.
+[[nodiscard]] constexpr std::uint64_t hashWithByte(std::uint64_t hash, char byte) noexcept {
+    return (hash ^ static_cast<unsigned char>(byte)) * 0x100000001b3ULL;
+}
+
 /// 64-bit FNV-1a: the same on every machine and in every run. `seed` continues an earlier hash.
 [[nodiscard]] constexpr std::uint64_t
 stableHash(std::string_view bytes, std::uint64_t seed = 0xcbf29ce484222325ULL) noexcept {
     std::uint64_t hash = seed;
-    for (const char byte : bytes) {
-        hash ^= static_cast<unsigned char>(byte);
-        hash *= 0x100000001b3ULL;
-    }
+    for (const char byte : bytes)
+        hash = hashWithByte(hash, byte);
     return hash;
 }
 
@@ -35,10 +38,10 @@ stableHashes(const std::array<std::string_view, HashLanes>& texts,
         std::min({texts[0].size(), texts[1].size(), texts[2].size(), texts[3].size()});
     auto [a, b, c, d] = seeds;
     for (std::size_t i = 0; i < common; ++i) {
-        a = stableHash(texts[0].substr(i, 1), a);
-        b = stableHash(texts[1].substr(i, 1), b);
-        c = stableHash(texts[2].substr(i, 1), c);
-        d = stableHash(texts[3].substr(i, 1), d);
+        a = hashWithByte(a, texts[0][i]);
+        b = hashWithByte(b, texts[1][i]);
+        c = hashWithByte(c, texts[2][i]);
+        d = hashWithByte(d, texts[3][i]);
     }
     return {stableHash(texts[0].substr(common), a),
             stableHash(texts[1].substr(common), b),

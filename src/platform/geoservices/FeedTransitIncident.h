@@ -80,12 +80,29 @@ public:
     initWithFields_details(Fields fields, Details details);
 
     [[nodiscard]] const Details& details() const noexcept { return _details; }
+
+    /// Feeds have one short text for whatever a rider is about to do: where the fields have no
+    /// message, it is the title.
+    [[nodiscard]] std::optional<std::string> messageForRoutePlanning() const override {
+        return orTitle(fields().messageForRoutePlanning);
+    }
+    [[nodiscard]] std::optional<std::string> messageForRouteStepping() const override {
+        return orTitle(fields().messageForRouteStepping);
+    }
+    [[nodiscard]] std::optional<std::string> messageForNonRoutable() const override {
+        return orTitle(fields().messageForNonRoutable);
+    }
     [[nodiscard]] std::shared_ptr<NSArray> affectedEntities() const override {
         return _details.entitySource ? _details.entitySource->affectedEntities()
                                      : fields().affectedEntities;
     }
 
 private:
+    [[nodiscard]] const std::optional<std::string>&
+    orTitle(const std::optional<std::string>& message) const noexcept {
+        return message ? message : fields().title;
+    }
+
     Details _details;
 };
 

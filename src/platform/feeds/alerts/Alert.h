@@ -37,7 +37,11 @@ struct Alert {
     std::vector<AlertPeriod> activePeriods;
     std::vector<AlertPeriod> communicationPeriods;
     std::vector<AlertPeriod> impactPeriods;
-    std::vector<AlertSelector> selectors;
+    std::vector<AlertSelector> selectors; ///< those that were read
+    bool hasUnreadSelectors = false;      ///< whether others were passed over
+    /// The fields of the alert among which all its selectors are, the read ones too: mostly nothing
+    /// else. Empty for a reader that passes over none.
+    std::string_view selectorFields;
     std::int32_t cause = 1;    ///< a number of `IncidentCause`
     std::int32_t effect = 8;   ///< a number of `IncidentEffect`
     std::int32_t severity = 1; ///< a number of `IncidentSeverity`

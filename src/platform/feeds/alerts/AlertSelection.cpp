@@ -61,6 +61,8 @@ public:
         return _shapes.skim(from, end);
     }
 
+    [[nodiscard]] const SelectorShapes& shapes() const noexcept { return _shapes; }
+
 private:
     [[nodiscard]] bool mayHaveRoute(std::string_view route) const {
         return _routes.contains(route) || hasBlankEnds(route);
@@ -282,6 +284,10 @@ void AlertSelection::choose() {
 
 bool AlertSelection::isChosen(std::size_t entity) const {
     return _ties->isChosen(entity);
+}
+
+const SelectorShapes& AlertSelection::shapes() const noexcept {
+    return _wanted->shapes();
 }
 
 } // namespace orvo

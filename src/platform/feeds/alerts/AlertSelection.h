@@ -10,6 +10,8 @@
 
 namespace orvo {
 
+class SelectorShapes;
+
 /// Finds the entities of messages that matter for some lines, without reading the others further
 /// than their selectors.
 ///
@@ -35,6 +37,10 @@ public:
     /// Ends the looking. Then it is known for each entity whether it is chosen.
     void choose();
     [[nodiscard]] bool isChosen(std::size_t entity) const;
+
+    /// Tells selectors that name none of the lines from a look at their first bytes. It gets better
+    /// at it with each entity looked at.
+    [[nodiscard]] const SelectorShapes& shapes() const noexcept;
 
 private:
     class Wanted;

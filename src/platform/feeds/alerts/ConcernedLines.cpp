@@ -1,16 +1,45 @@
 #include "platform/feeds/alerts/ConcernedLines.h"
 
+#include "platform/feeds/alerts/EntityReader.h"
+
 #include <algorithm>
 
 namespace orvo {
 
+namespace {
+
+/// Whether the selector leaves the route to the schedule.
+bool isBroad(const AlertSelector& selector) {
+    return SelectorResolver::routeOf(selector).empty();
+}
+
+} // namespace
+
 void ConcernedLines::find(const Incident& incident) {
+    const auto isWhole = [](const IncidentMember& member) {
+        return !member.alert->hasUnreadSelectors;
+    };
+    _areAll = std::ranges::all_of(incident.members, isWhole);
+    const auto needsSchedule = [](const IncidentMember& member) {
+        return std::ranges::any_of(member.alert->selectors, isBroad);
+    };
+    if (!_areAll && std::ranges::any_of(incident.members, needsSchedule))
+        return findAll(incident);
+    collect(incident);
+}
+
+void ConcernedLines::findAll(const Incident& incident) {
+    _areAll = true;
+    collect(incident);
+}
+
+void ConcernedLines::collect(const Incident& incident) {
     _lines.clear();
     _stops.clear();
     _members.clear();
     _mentions.clear();
     for (std::size_t member = 0; member < incident.members.size(); ++member)
-        addMentions(*incident.members[member].alert, member);
+        addMentions(selectorsOf(*incident.members[member].alert), member);
     const auto isBefore = [](const Mention& a, const Mention& b) {
         return a.place != b.place ? a.place < b.place : a < b;
     };
@@ -21,23 +50,31 @@ void ConcernedLines::find(const Incident& incident) {
     finishLine();
 }
 
+/// Those that were read, or all.
+const std::vector<AlertSelector>& ConcernedLines::selectorsOf(const Alert& alert) {
+    if (!_areAll || !alert.hasUnreadSelectors)
+        return alert.selectors;
+    _reread.clear();
+    EntityReader::readSelectors(alert.selectorFields, _reread);
+    return _reread;
+}
+
 /// A selector without a route may name every line of an agency: said twice by one alert it is taken
 /// once.
-void ConcernedLines::addMentions(const Alert& alert, std::size_t member) {
+void ConcernedLines::addMentions(const std::vector<AlertSelector>& selectors, std::size_t member) {
     _broad.clear();
-    for (const AlertSelector& selector : alert.selectors) {
+    for (const AlertSelector& selector : selectors) {
         const bool isPart = SelectorResolver::namesPart(selector);
-        const bool isBroad = SelectorResolver::routeOf(selector).empty();
-        if (isBroad &&
+        if (isBroad(selector) &&
             !_broad
                  .emplace(
                      selector.agencyId, selector.stopId, selector.routeType.value_or(-1), isPart)
                  .second)
             continue;
         _named.clear();
-        if (!isBroad || _broadLeft > 0)
+        if (!isBroad(selector) || _broadLeft > 0)
             _resolver.resolve(selector, _named);
-        if (isBroad && !takeBroad())
+        if (isBroad(selector) && !takeBroad())
             continue;
         for (const LineTable::Place place : _named)
             _mentions.push_back({place, isPart, member, selector.stopId});

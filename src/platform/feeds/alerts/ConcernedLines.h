@@ -29,8 +29,13 @@ public:
     explicit ConcernedLines(SelectorResolver& resolver)
         : _resolver(resolver) {}
 
-    /// Finds the lines of an incident, in the place of the last one's.
+    /// Finds the lines of an incident, in the place of the last one's: those that the selectors
+    /// name that were read. When one of them needs the schedule to know its lines, all are read.
     void find(const Incident& incident);
+    /// Finds all lines, by the selectors too that were passed over when the alerts were read.
+    void findAll(const Incident& incident);
+    /// Whether no selector was passed over.
+    [[nodiscard]] bool areAll() const noexcept { return _areAll; }
 
     /// How many selectors named too many lines to be followed, over all incidents: each may name
     /// any line.
@@ -64,12 +69,16 @@ private:
         }
     };
 
-    void addMentions(const Alert& alert, std::size_t member);
+    void collect(const Incident& incident);
+    void addMentions(const std::vector<AlertSelector>& selectors, std::size_t member);
+    [[nodiscard]] const std::vector<AlertSelector>& selectorsOf(const Alert& alert);
     [[nodiscard]] bool takeBroad();
     void takeMention(const Mention& mention);
     void finishLine();
 
     SelectorResolver& _resolver;
+    bool _areAll = true;
+    std::vector<AlertSelector> _reread; // of an alert of which some were passed over
     std::vector<Line> _lines;
     std::vector<std::string_view> _stops;
     std::vector<std::size_t> _members;

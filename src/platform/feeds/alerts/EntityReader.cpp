@@ -1,8 +1,11 @@
 #include "platform/feeds/alerts/EntityReader.h"
 
 #include "platform/feeds/alerts/ByteScan.h"
+#include "platform/feeds/alerts/SelectorShapes.h"
 #include "platform/feeds/alerts/WireCursor.h"
 #include "platform/foundation/Text.h"
+
+#include <utility>
 
 namespace orvo {
 
@@ -33,6 +36,7 @@ constexpr std::uint64_t LastEffect = 11;
 constexpr std::uint64_t LastSeverity = 4;
 constexpr std::size_t MostTranslations = 200;
 constexpr std::size_t UsualTranslations = 2; // room is made for so many at once
+constexpr std::size_t UsualPeriods = 4;
 
 bool isText(std::string_view bytes) {
     return ByteScan::isASCII(bytes) || Text::isValidUTF8(bytes);
@@ -89,6 +93,8 @@ AlertReading EntityReader::read(std::string_view entity) {
     _statistics.add(AlertCount::Entities);
     AlertReading reading;
     _selectors.clear();
+    _selectorFields = {};
+    _mayPassOver = _passedOver != nullptr;
     std::string_view id;
     bool isDeleted = false;
     WireCursor cursor(entity);
@@ -107,7 +113,9 @@ AlertReading EntityReader::read(std::string_view entity) {
                 _statistics.add(AlertCount::UnreadableNumbers);
             break;
         case EntityField::Alert:
-            if (!reading.alert)
+            if (reading.alert)
+                readPassedOver(*reading.alert);
+            else
                 reading.alert.emplace();
             if (isBytes(cursor)) {
                 readAlert(cursor.bytes(), reading);
@@ -132,6 +140,7 @@ AlertReading EntityReader::read(std::string_view entity) {
         _statistics.add(AlertCount::Alerts);
         reading.alert->id = id;
         reading.alert->selectors = _selectors;
+        reading.alert->selectorFields = _selectorFields;
     } else if (!cursor.failed()) {
         _statistics.add(AlertCount::OtherEntities);
     }
@@ -140,12 +149,47 @@ AlertReading EntityReader::read(std::string_view entity) {
 
 void EntityReader::readAlert(std::string_view bytes, AlertReading& reading) {
     WireCursor cursor(bytes);
-    while (cursor.next())
+    for (const char* begin = cursor.position(); cursor.next(); begin = cursor.position()) {
         readAlertField(cursor, reading);
+        if (!_mayPassOver)
+            continue;
+        if (cursor.field() == AlertField::InformedEntity)
+            addSelectorFields(begin, cursor.position());
+        // Mostly the selectors come behind the periods.
+        if (cursor.field() == AlertField::InformedEntity ||
+            cursor.field() == AlertField::ActivePeriod)
+            passOver(cursor, *reading.alert);
+    }
     if (cursor.failed()) {
         _statistics.add(AlertCount::UnreadableAlerts);
         reading.mayConcernAnyLine = true;
     }
+}
+
+void EntityReader::passOver(WireCursor& cursor, Alert& alert) {
+    const char* const begin = cursor.position();
+    cursor.skipWith(
+        [&](const char* from, const char* end) noexcept { return _passedOver->skim(from, end); });
+    if (cursor.position() == begin)
+        return;
+    addSelectorFields(begin, cursor.position());
+    alert.hasUnreadSelectors = true;
+}
+
+/// An entity with a second alert, which is a mistake, has its selectors in two places.
+void EntityReader::readPassedOver(Alert& alert) {
+    if (std::exchange(alert.hasUnreadSelectors, false)) {
+        _selectors.clear();
+        readSelectors(_selectorFields, _selectors);
+    }
+    _selectorFields = {};
+    _mayPassOver = false;
+}
+
+void EntityReader::addSelectorFields(const char* begin, const char* end) {
+    if (!_selectorFields.empty())
+        begin = _selectorFields.data();
+    _selectorFields = {begin, static_cast<std::size_t>(end - begin)};
 }
 
 void EntityReader::readAlertField(const WireCursor& field, AlertReading& reading) {
@@ -179,6 +223,8 @@ void EntityReader::readAlertField(const WireCursor& field, AlertReading& reading
 }
 
 void EntityReader::readPeriod(const WireCursor& field, std::vector<AlertPeriod>& periods) {
+    if (periods.empty())
+        periods.reserve(UsualPeriods);
     AlertPeriod period;
     // One that cannot be read leaves open when the alert holds; dropped, it would end it, or bring
     // an older one back.
@@ -245,6 +291,16 @@ void EntityReader::takeSelector(const WireCursor& field, AlertReading& reading) 
         return _statistics.add(AlertCount::EmptySelectors);
     reading.mayConcernAnyLine = true;
     _statistics.add(AlertCount::UnreadableSelectors);
+}
+
+void EntityReader::readSelectors(std::string_view fields, std::vector<AlertSelector>& selectors) {
+    WireCursor cursor(fields);
+    while (cursor.next()) {
+        AlertSelector selector;
+        if (cursor.key() == WireCursor::bytes(AlertField::InformedEntity) &&
+            readSelector(cursor.bytes(), selector) && !isEmpty(selector))
+            selectors.push_back(selector);
+    }
 }
 
 bool EntityReader::readEffect(std::uint64_t number, std::int32_t& effect) noexcept {

@@ -10,6 +10,7 @@
 
 namespace orvo {
 
+class SelectorShapes;
 class WireCursor;
 
 /// What one entity holds.
@@ -26,9 +27,11 @@ struct AlertReading {
 /// costs many times its own size.
 class EntityReader {
 public:
-    /// `statistics` outlives the reader.
-    explicit EntityReader(AlertStatistics& statistics)
-        : _statistics(statistics) {}
+    /// @param passedOver selectors that need not be read: those that fit these shapes, and name
+    /// none of their wanted routes. Nil to read all. Both outlive the reader.
+    explicit EntityReader(AlertStatistics& statistics, const SelectorShapes* passedOver = nullptr)
+        : _statistics(statistics)
+        , _passedOver(passedOver) {}
 
     [[nodiscard]] AlertReading read(std::string_view entity);
 
@@ -36,6 +39,9 @@ public:
     /// read: all its fields hold together, so that one without a bad field would name more than
     /// the feed meant.
     [[nodiscard]] static bool readSelector(std::string_view bytes, AlertSelector& selector);
+    /// Appends the selectors among some fields of alerts, without those that are empty or cannot be
+    /// read.
+    static void readSelectors(std::string_view fields, std::vector<AlertSelector>& selectors);
     /// Takes the number of an effect or a severity; an unlisted one changes nothing.
     /// @return whether it is listed
     static bool readEffect(std::uint64_t number, std::int32_t& effect) noexcept;
@@ -43,6 +49,9 @@ public:
 
 private:
     void readAlert(std::string_view bytes, AlertReading& reading);
+    void passOver(WireCursor& cursor, Alert& alert);
+    void readPassedOver(Alert& alert);
+    void addSelectorFields(const char* begin, const char* end);
     void readAlertField(const WireCursor& field, AlertReading& reading);
     void readPeriod(const WireCursor& field, std::vector<AlertPeriod>& periods);
     void takeSelector(const WireCursor& field, AlertReading& reading);
@@ -54,7 +63,11 @@ private:
     [[nodiscard]] bool takeOne() noexcept;
 
     AlertStatistics& _statistics;
-    std::vector<AlertSelector> _selectors; // of the entity being read
+    const SelectorShapes* _passedOver;
+    // Of the entity being read.
+    std::vector<AlertSelector> _selectors;
+    std::string_view _selectorFields;
+    bool _mayPassOver = false;
     std::size_t _repeatsLeft = 1'000'000;
 };
 

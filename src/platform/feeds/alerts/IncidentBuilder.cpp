@@ -23,14 +23,14 @@ namespace {
 /// One answer in the making.
 class Build {
 public:
-    Build(const LineTable& table,
+    Build(const std::shared_ptr<const LineTable>& table,
           const std::vector<AlertSource>& sources,
           const IncidentQuery& query)
         : _table(table)
-        , _index(table.index())
+        , _index(table->index())
         , _sources(sources)
         , _query(query)
-        , _askedAt(_table.count(), NotAsked) {}
+        , _askedAt(_table->count(), NotAsked) {}
 
     FeedIncidents run() {
         prepareLines();
@@ -48,7 +48,7 @@ private:
     void prepareLines() {
         if (_query.lines) {
             for (const std::uint64_t muid : *_query.lines)
-                addLine(muid, _table.placeOf(muid));
+                addLine(muid, _table->placeOf(muid));
         } else {
             for (const ScheduleLine& line : _index.lines())
                 addLine(line.muid, static_cast<LineTable::Place>(_result.lines.size()));
@@ -94,7 +94,8 @@ private:
         for (std::size_t source = 0; source < _sources.size(); ++source) {
             if (!_proofs[source].message)
                 continue;
-            EntityReader reader(_result.sources[source].statistics);
+            EntityReader reader(_result.sources[source].statistics,
+                                _selection ? &_selection->shapes() : nullptr);
             for (const std::string_view entity : _proofs[source].message->entities)
                 if (!_selection || _selection->isChosen(place++))
                     mergeAlert(reader.read(entity), source, merger);
@@ -118,13 +119,16 @@ private:
         RecordContext context{_index.feed(),
                               _index.timezone(),
                               {},
-                              IncidentWording(_query.language, _index.language())};
+                              IncidentWording(_query.language, _index.language()),
+                              _table};
         for (const SourceProof& proof : _proofs)
-            context.headerTimes.push_back(proof.headerTime);
-        SelectorResolver resolver(_table, _result.statistics);
+            context.headerDates.push_back(NSDate::dateWithTimeIntervalSince1970(proof.headerTime));
+        SelectorResolver resolver(*_table, _result.statistics);
         ConcernedLines lines(resolver);
         for (const Incident& incident : incidents) {
             lines.find(incident);
+            if (!lines.areAll() && context.wording.mayBeOnlyName(incident, _table->longestName()))
+                lines.findAll(incident);
             buildIncident(context, incident, lines);
         }
         _hasLostStops = resolver.hasLostStops();
@@ -137,12 +141,10 @@ private:
                        const ConcernedLines& lines) {
         _result.statistics.add(AlertCount::Incidents);
         _result.statistics.add(AlertCount::RepeatedAlerts, incident.members.size() - 1);
-        if (lines.lines().empty())
+        if (lines.lines().empty() && lines.areAll())
             return _result.statistics.add(AlertCount::AlertsOfNoLine, incident.members.size());
-        const MemberPeriods periods = periodsOfMembers(incident);
         std::optional<IncidentRecords> records;
         std::span<const std::size_t> members; // never none for a line
-        std::vector<IncidentPeriod> ofMembers;
         for (const ConcernedLines::Line& line : lines.lines()) {
             const std::size_t position = _askedAt[line.place];
             if (position == NotAsked)
@@ -150,37 +152,34 @@ private:
             // Mostly the same alerts name all lines: what they come to is not worked out again.
             if (!std::ranges::equal(members, lines.membersOf(line))) {
                 members = lines.membersOf(line);
-                ofMembers = periodsOf(members, periods);
+                findPeriods(incident, members);
             }
-            for (const IncidentPeriod& period : ofMembers) {
+            for (const IncidentPeriod& period : _periods) {
                 if (!records)
                     records.emplace(context, incident, lines);
                 _result.lines[position].incidents.push_back(records->record(line, period));
             }
         }
-        const auto isInTime = [&](const auto& ofOne) {
-            return !IncidentPeriods::currentAndComing(ofOne, _query.now).empty();
-        };
-        if (!records && std::none_of(periods.begin(), periods.end(), isInTime))
+        if (!records && isOutOfTime(incident))
             _result.statistics.add(AlertCount::AlertsOutOfTime, incident.members.size());
     }
 
-    using MemberPeriods = std::vector<std::vector<IncidentPeriod>>;
-
-    static MemberPeriods periodsOfMembers(const Incident& incident) {
-        MemberPeriods periods;
-        periods.reserve(incident.members.size());
-        for (const IncidentMember& member : incident.members)
-            periods.push_back(IncidentPeriods::ofAlert(*member.alert));
-        return periods;
+    /// What the periods of some members of an incident come to.
+    void findPeriods(const Incident& incident, std::span<const std::size_t> members) {
+        _periods.clear();
+        for (const std::size_t member : members)
+            IncidentPeriods::addOfAlert(*incident.members[member].alert, _periods);
+        IncidentPeriods::keepCurrentAndComing(_periods, _query.now);
     }
 
-    [[nodiscard]] std::vector<IncidentPeriod> periodsOf(std::span<const std::size_t> members,
-                                                        const MemberPeriods& ofMembers) const {
-        std::vector<IncidentPeriod> periods;
-        for (const std::size_t member : members)
-            periods.insert(periods.end(), ofMembers[member].begin(), ofMembers[member].end());
-        return IncidentPeriods::currentAndComing(std::move(periods), _query.now);
+    /// Whether none of its alerts holds now or within a day.
+    [[nodiscard]] bool isOutOfTime(const Incident& incident) {
+        for (std::size_t member = 0; member < incident.members.size(); ++member) {
+            findPeriods(incident, std::span(&member, 1));
+            if (!_periods.empty())
+                return false;
+        }
+        return true;
     }
 
     /// Puts the line's incidents in order, and says so where its status could not be proven. A
@@ -273,7 +272,7 @@ private:
             fmt::format("The service alerts of {} could not be read: {}", _index.feed(), cause));
     }
 
-    const LineTable& _table;
+    const std::shared_ptr<const LineTable>& _table;
     const LineIndex& _index;
     const std::vector<AlertSource>& _sources;
     const IncidentQuery& _query;
@@ -281,7 +280,8 @@ private:
     std::vector<std::size_t> _sameAs;  // by place in the answer: the first place of the same line
     std::optional<AlertSelection> _selection; // nothing when all lines are asked about
     std::vector<SourceProof> _proofs;
-    std::deque<Alert> _alerts; // incidents point to them
+    std::deque<Alert> _alerts;            // incidents point to them
+    std::vector<IncidentPeriod> _periods; // of the incident at hand
     bool _hasLostSelectors = false;
     bool _hasLostStops = false; // selectors with stops may name any line
     FeedIncidents _result;
@@ -290,12 +290,11 @@ private:
 } // namespace
 
 IncidentBuilder::IncidentBuilder(std::shared_ptr<const LineIndex> index)
-    : _index(std::move(index))
-    , _table(std::make_shared<LineTable>(*_index)) {}
+    : _table(std::make_shared<LineTable>(std::move(index))) {}
 
 FeedIncidents IncidentBuilder::build(const std::vector<AlertSource>& sources,
                                      const IncidentQuery& query) const {
-    return Build(*_table, sources, query).run();
+    return Build(_table, sources, query).run();
 }
 
 } // namespace orvo

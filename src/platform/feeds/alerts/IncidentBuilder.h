@@ -71,7 +71,6 @@ public:
                                       const IncidentQuery& query) const;
 
 private:
-    std::shared_ptr<const LineIndex> _index;
     std::shared_ptr<const LineTable> _table; // of the index
 };
 

@@ -62,8 +62,17 @@ void IncidentMerger::add(Alert& alert, std::size_t source) {
         unite(*partner, incidentOf(alert, source));
         return;
     }
-    if (!alert.id.empty())
-        _byId[alert.id].push_back(_incidents.size());
+    addIncident(alert, source);
+}
+
+void IncidentMerger::addIncident(Alert& alert, std::size_t source) {
+    const std::size_t place = _incidents.size();
+    if (!alert.id.empty()) {
+        const auto [sameId, isNew] = _byId.try_emplace(alert.id, SameId{place, place});
+        if (!isNew)
+            _nextOfId[std::exchange(sameId->second.last, place)] = place;
+    }
+    _nextOfId.push_back(0);
     _incidents.push_back(incidentOf(alert, source));
 }
 
@@ -73,15 +82,16 @@ Incident* IncidentMerger::translationPartner(const Alert& alert, std::size_t sou
     const auto sameId = _byId.find(alert.id);
     if (sameId == _byId.end())
         return nullptr;
-    std::size_t looked = 0;
-    for (const std::size_t position : sameId->second) {
-        Incident& incident = _incidents[position];
+    std::size_t place = sameId->second.first;
+    for (std::size_t looked = 0; looked < MostUnderOneId; ++looked) {
+        Incident& incident = _incidents[place];
         if (incident.effect == alert.effect && incident.header.size() < MostLanguages &&
             incident.members.front().source == source &&
             !sharesLanguage(incident.header, alert.header) &&
             !sharesLanguage(incident.description, alert.description))
             return &incident;
-        if (++looked == MostUnderOneId)
+        place = _nextOfId[place];
+        if (place == 0)
             break;
     }
     return nullptr;

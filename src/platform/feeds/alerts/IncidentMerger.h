@@ -30,6 +30,7 @@ public:
     [[nodiscard]] std::vector<Incident> take();
 
 private:
+    void addIncident(Alert& alert, std::size_t source);
     [[nodiscard]] Incident* translationPartner(const Alert& alert, std::size_t source);
     [[nodiscard]] IncidentContent contentOf(const Incident& incident) const;
     void mergeSameContent();
@@ -38,7 +39,12 @@ private:
     LanguagePreference _preference;
     std::vector<Incident> _incidents;
     std::size_t _source = 0;
-    SeededTextMap<std::string_view, std::vector<std::size_t>> _byId; // of the current source
+    /// The places of the first and the last incident of one identifier.
+    struct SameId {
+        std::size_t first = 0, last = 0;
+    };
+    SeededTextMap<std::string_view, SameId> _byId; // of the current source
+    std::vector<std::size_t> _nextOfId;            // beside the incidents: 0 behind the last
 };
 
 } // namespace orvo

@@ -66,16 +66,13 @@ std::optional<IncidentPeriod> fromPublished(const AlertPeriod& period) noexcept 
     return result;
 }
 
-std::vector<IncidentPeriod> ofAlert(const Alert& alert) {
+void addOfAlert(const Alert& alert, std::vector<IncidentPeriod>& periods) {
     const std::vector<AlertPeriod>& published = publishedPeriods(alert);
     if (published.empty())
-        return {IncidentPeriod{}};
-    std::vector<IncidentPeriod> periods;
-    periods.reserve(published.size());
+        periods.emplace_back();
     for (const AlertPeriod& period : published)
         if (const auto result = fromPublished(period))
             periods.push_back(*result);
-    return periods;
 }
 
 std::optional<std::int64_t> earliestStart(const Alert& alert) noexcept {
@@ -92,22 +89,22 @@ std::optional<std::int64_t> earliestStart(const Alert& alert) noexcept {
     return earliest;
 }
 
-std::vector<IncidentPeriod> currentAndComing(std::vector<IncidentPeriod> periods, double now) {
+void keepCurrentAndComing(std::vector<IncidentPeriod>& periods, double now) {
     std::erase_if(periods, [&](const IncidentPeriod& period) { return isOver(period, now); });
     std::sort(periods.begin(), periods.end(), [](const auto& a, const auto& b) {
         return startOf(a) < startOf(b);
     });
-    std::vector<IncidentPeriod> joined;
+    std::size_t joined = 0;
     for (const IncidentPeriod& period : periods) {
-        if (joined.empty() || !continues(joined.back(), period))
-            joined.push_back(period);
-        else if (joined.back().end)
-            joined.back().end = period.end ? std::max(*joined.back().end, *period.end) : period.end;
+        if (joined == 0 || !continues(periods[joined - 1], period))
+            periods[joined++] = period;
+        else if (auto& end = periods[joined - 1].end)
+            end = period.end ? std::max(end, period.end) : period.end;
     }
-    std::erase_if(joined, [&](const IncidentPeriod& period) {
+    periods.resize(joined);
+    std::erase_if(periods, [&](const IncidentPeriod& period) {
         return period.start && static_cast<double>(*period.start) > now + Horizon;
     });
-    return joined;
 }
 
 bool isCurrent(const IncidentPeriod& period, double now) noexcept {

@@ -1,7 +1,7 @@
 #include "platform/feeds/alerts/IncidentRecords.h"
 
+#include "platform/feeds/alerts/EntityReader.h"
 #include "platform/feeds/alerts/FeedAffectedEntity.h"
-#include "platform/foundation/NSDate.h"
 
 #include <algorithm>
 #include <utility>
@@ -70,6 +70,41 @@ private:
     std::shared_ptr<std::vector<std::string>> _stops = std::make_shared<std::vector<std::string>>();
 };
 
+/// The selectors of an incident as they came. Few are asked for what they name besides the lines
+/// that were asked about.
+class UnresolvedEntities final : public AffectedEntitySource {
+public:
+    UnresolvedEntities(std::shared_ptr<const LineTable> table, const Incident& incident)
+        : _table(std::move(table)) {
+        for (const IncidentMember& member : incident.members)
+            _selectorFields += member.alert->selectorFields;
+    }
+
+    [[nodiscard]] std::shared_ptr<NSArray> affectedEntities() const override {
+        Alert alert;
+        EntityReader::readSelectors(_selectorFields, alert.selectors);
+        Incident incident;
+        incident.members = {{&alert, 0}};
+        AlertStatistics unused;
+        SelectorResolver resolver(*_table, unused);
+        ConcernedLines lines(resolver);
+        lines.find(incident);
+        return ConcernedEntities(lines).affectedEntities();
+    }
+
+private:
+    std::shared_ptr<const LineTable> _table;
+    std::string _selectorFields;
+};
+
+std::shared_ptr<const AffectedEntitySource> entitySourceOf(const RecordContext& context,
+                                                           const Incident& incident,
+                                                           const ConcernedLines& lines) {
+    if (lines.areAll())
+        return std::make_shared<ConcernedEntities>(lines);
+    return std::make_shared<UnresolvedEntities>(context.table, incident);
+}
+
 std::optional<std::int64_t> earliestStart(const Incident& incident) {
     std::optional<std::int64_t> earliest;
     for (const IncidentMember& member : incident.members)
@@ -93,27 +128,33 @@ IncidentRecords::IncidentRecords(const RecordContext& context,
     IncidentTexts texts = context.wording.textsOf(incident, lines, _details.cause);
     _details.spokenTitle = std::move(texts.spokenTitle);
     _details.link = std::move(texts.link);
-    _details.entitySource = std::make_shared<ConcernedEntities>(lines);
+    _details.entitySource = entitySourceOf(context, incident, lines);
     _fields = sharedFields(std::move(texts));
 }
 
 TransitIncidentRecord::Fields IncidentRecords::sharedFields(IncidentTexts texts) const {
-    double headerTime = 0;
-    for (const IncidentMember& member : _incident.members)
-        headerTime = std::max(headerTime, _context.headerTimes[member.source]);
     TransitIncidentRecord::Fields fields;
     fields.muid = _incident.muid;
-    fields.messageForRoutePlanning = texts.title;
-    fields.messageForRouteStepping = texts.title;
-    fields.messageForNonRoutable = texts.title;
     fields.title = std::move(texts.title);
     fields.summary = std::move(texts.summary);
     fields.fullDescription = std::move(texts.fullDescription);
     fields.iconType = _incident.effect;
-    fields.lastUpdated = NSDate::dateWithTimeIntervalSince1970(headerTime);
+    fields.lastUpdated = latestHeaderDate();
     const auto start = earliestStart(_incident);
     fields.creationDate = start ? dateOf(start) : fields.lastUpdated;
     return fields;
+}
+
+std::shared_ptr<NSDate> IncidentRecords::latestHeaderDate() const {
+    const auto dateOfMember = [&](const IncidentMember& member) {
+        return _context.headerDates[member.source];
+    };
+    std::shared_ptr<NSDate> latest = dateOfMember(_incident.members.front());
+    for (const IncidentMember& member : _incident.members)
+        if (const auto date = dateOfMember(member);
+            date->timeIntervalSinceReferenceDate() > latest->timeIntervalSinceReferenceDate())
+            latest = date;
+    return latest;
 }
 
 const std::string& IncidentRecords::timeZoneOf(const ConcernedLines::Line& line) const {

@@ -4,6 +4,7 @@
 #include "platform/feeds/alerts/Incident.h"
 #include "platform/feeds/alerts/IncidentPeriods.h"
 #include "platform/feeds/alerts/IncidentWording.h"
+#include "platform/foundation/NSDate.h"
 #include "platform/geoservices/FeedTransitIncident.h"
 
 #include <memory>
@@ -14,10 +15,11 @@ namespace orvo {
 
 /// What all records of one feed have in common.
 struct RecordContext {
-    std::string feed;                ///< the feed's short name
-    std::string timeZone;            ///< where an agency has none of its own; may be empty
-    std::vector<double> headerTimes; ///< of each source, in seconds since 1970
+    std::string feed;     ///< the feed's short name
+    std::string timeZone; ///< where an agency has none of its own; may be empty
+    std::vector<std::shared_ptr<NSDate>> headerDates; ///< of each source: when it was made
     IncidentWording wording;
+    std::shared_ptr<const LineTable> table;
 };
 
 /// Makes the records of one incident. What they share is made once.
@@ -37,6 +39,7 @@ private:
     [[nodiscard]] const std::string& timeZoneOf(const ConcernedLines::Line& line) const;
     [[nodiscard]] std::shared_ptr<FeedTransitIncident> made(const ConcernedLines::Line& line,
                                                             const IncidentPeriod& period) const;
+    [[nodiscard]] std::shared_ptr<NSDate> latestHeaderDate() const;
     [[nodiscard]] TransitIncidentRecord::Fields sharedFields(IncidentTexts texts) const;
 
     const RecordContext& _context;

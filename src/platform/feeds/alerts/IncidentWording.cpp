@@ -83,6 +83,14 @@ IncidentTexts IncidentWording::textsOf(const Incident& incident,
     return texts;
 }
 
+bool IncidentWording::mayBeOnlyName(const Incident& incident, std::size_t nameLength) const {
+    std::string room;
+    const AlertText* const header =
+        _preference.bestPair(incident.header, incident.description).header;
+    return header &&
+           !isLongerThanName(TextCleaner::cleanLine(header->text, room).size(), nameLength);
+}
+
 std::string IncidentWording::summaryOf(std::string_view description, std::string_view header) {
     while (!description.empty()) {
         const std::string_view paragraph = TextCleaner::firstParagraph(description);

@@ -34,6 +34,10 @@ public:
     [[nodiscard]] IncidentTexts
     textsOf(const Incident& incident, const ConcernedLines& lines, IncidentCause cause) const;
 
+    /// Whether the title may turn out to be only the name of a line, if it has no longer one.
+    /// @param nameLength of its short and its long name together, in bytes
+    [[nodiscard]] bool mayBeOnlyName(const Incident& incident, std::size_t nameLength) const;
+
     /// The first paragraph of the description, on one line, without the header where it begins with
     /// it; the next paragraph where that was all. Empty when nothing else is said.
     [[nodiscard]] static std::string summaryOf(std::string_view description,

@@ -5,19 +5,20 @@
 
 #include <algorithm>
 #include <bit>
+#include <utility>
 
 namespace orvo {
 
-LineTable::LineTable(const LineIndex& index)
-    : _index(index)
-    , _slots(std::bit_ceil(2 * index.lines().size() + 2), None) {
-    _entries.reserve(index.lines().size());
+LineTable::LineTable(std::shared_ptr<const LineIndex> index)
+    : _index(std::move(index))
+    , _slots(std::bit_ceil(2 * _index->lines().size() + 2), None) {
+    _entries.reserve(_index->lines().size());
     std::size_t length = 0;
-    for (const ScheduleLine& line : index.lines())
+    for (const ScheduleLine& line : _index->lines())
         length += line.routeId.size();
     _routeIds.reserve(length); // views into it stay good
     std::string_view agency;   // that of neighbours is mostly the same text: kept where it is warm
-    for (const ScheduleLine& line : index.lines()) {
+    for (const ScheduleLine& line : _index->lines()) {
         if (agency != line.agencyId)
             agency = line.agencyId;
         const auto place = static_cast<Place>(_entries.size());
@@ -35,12 +36,13 @@ LineTable::LineTable(const LineIndex& index)
             slot = (slot + 1) % _slots.size();
         _slots[slot] = place;
         _longestProbe = std::max(_longestProbe, probe);
+        _longestName = std::max(_longestName, _entries.back().nameLength);
     }
 }
 
 LineTable::Place LineTable::placeOf(std::uint64_t muid) const {
-    const ScheduleLine* const line = _index.line(muid);
-    return line ? static_cast<Place>(line - _index.lines().data()) : None;
+    const ScheduleLine* const line = _index->line(muid);
+    return line ? static_cast<Place>(line - _index->lines().data()) : None;
 }
 
 LineTable::Place LineTable::placeOfRoute(std::string_view routeId) const {
@@ -52,7 +54,7 @@ LineTable::Place LineTable::placeOfRoute(std::string_view routeId) const {
             return _slots[slot];
     // The index knows what does not count, such as blanks around an identifier.
     const bool isPlain = routeId.front() > ' ' && routeId.back() > ' ';
-    const auto muid = isPlain ? std::nullopt : _index.lineForRoute(routeId);
+    const auto muid = isPlain ? std::nullopt : _index->lineForRoute(routeId);
     return muid ? placeOf(*muid) : None;
 }
 

@@ -4,6 +4,7 @@
 
 #include <cstddef>
 #include <cstdint>
+#include <memory>
 #include <string>
 #include <string_view>
 #include <vector>
@@ -26,12 +27,11 @@ public:
         std::uint64_t muid = 0;
     };
 
-    /// The index outlives the table.
-    explicit LineTable(const LineIndex& index);
+    explicit LineTable(std::shared_ptr<const LineIndex> index);
     LineTable(const LineTable&) = delete;
     LineTable& operator=(const LineTable&) = delete;
 
-    [[nodiscard]] const LineIndex& index() const noexcept { return _index; }
+    [[nodiscard]] const LineIndex& index() const noexcept { return *_index; }
     [[nodiscard]] std::size_t count() const noexcept { return _entries.size(); }
     [[nodiscard]] const Entry& at(Place place) const noexcept { return _entries[place]; }
     /// `None` for a line that the schedule does not have.
@@ -41,15 +41,18 @@ public:
     /// How many slots were passed to find room for the line that lies farthest from its own: tens
     /// at most, since nobody who writes a schedule can tell the slots of its lines.
     [[nodiscard]] std::size_t longestProbe() const noexcept { return _longestProbe; }
+    /// The greatest `nameLength` of all lines; 0 without any.
+    [[nodiscard]] std::size_t longestName() const noexcept { return _longestName; }
 
 private:
     [[nodiscard]] std::size_t slotOf(std::string_view routeId) const noexcept;
 
-    const LineIndex& _index;
+    std::shared_ptr<const LineIndex> _index;
     std::string _routeIds; // of all entries, where they lie close together
     std::vector<Entry> _entries;
     std::vector<Place> _slots; // open addressing; at most half full
     std::size_t _longestProbe = 0;
+    std::size_t _longestName = 0;
 };
 
 } // namespace orvo

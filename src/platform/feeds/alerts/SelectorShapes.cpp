@@ -4,6 +4,7 @@
 
 #include <algorithm>
 #include <string>
+#include <utility>
 
 namespace orvo {
 
@@ -104,8 +105,8 @@ const char* SelectorShapes::skim(const char* position, const char* end) const no
         if (size > Longest || size > left)
             break;
         const bool isPassedOver = left >= Longest
-                                      ? isUnwanted(_shapes[size], selector)
-                                      : isUnwanted(_shapes[size], padded({selector, size}).data());
+                                      ? isUnwanted(_known[size], selector)
+                                      : isUnwanted(_known[size], padded({selector, size}).data());
         if (!isPassedOver)
             break;
         position = selector + size;
@@ -113,7 +114,7 @@ const char* SelectorShapes::skim(const char* position, const char* end) const no
     return position;
 }
 
-/// The shape takes the place of the last one of the same length.
+/// The shape takes the place of the older one of the same length.
 void SelectorShapes::learn(std::string_view selector, std::string_view route) {
     const auto routeEnd = static_cast<std::size_t>(route.data() - selector.data()) + route.size();
     if (selector.size() > Longest || route.size() > ByteScan::Word || routeEnd < ByteScan::Word)
@@ -125,7 +126,7 @@ void SelectorShapes::learn(std::string_view selector, std::string_view route) {
         if (key != RouteType) // any number of one byte fits
             mask[begin + 1] = static_cast<char>(0xFF);
     });
-    Shape& shape = _shapes[selector.size()];
+    Shape shape;
     const std::array<char, Longest> value = padded(selector);
     for (std::size_t word = 0; word < Words; ++word) {
         shape.mask[word] = ByteScan::wordAt(mask.data() + word * ByteScan::Word);
@@ -135,6 +136,9 @@ void SelectorShapes::learn(std::string_view selector, std::string_view route) {
     shape.routeWord = routeEnd - ByteScan::Word;
     shape.routeMask = wordEndingWith(std::string(route.size(), '\xFF'), '\0');
     shape.besidesRoute = wordEndingWith(std::string(route.size(), '\0'), '~');
+    Known& known = _known[selector.size()];
+    if (shape != known.newer)
+        known.older = std::exchange(known.newer, shape);
 }
 
 } // namespace orvo

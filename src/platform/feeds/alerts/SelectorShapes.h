@@ -42,19 +42,30 @@ private:
         std::size_t routeWord = 0;      ///< where the word that ends with the route begins
         std::uint64_t routeMask = 0;    ///< the route's bytes in it
         std::uint64_t besidesRoute = 0; ///< visible characters in the place of all others
+
+        friend bool operator==(const Shape&, const Shape&) = default;
+    };
+    /// What was learnt of the selectors of one length: a route may be shorter by what a stop is
+    /// longer.
+    struct Known {
+        Shape newer;
+        Shape older;
     };
 
     /// Whether a selector that begins here has the shape, and a route that is not wanted. `Longest`
     /// bytes can be read.
     [[nodiscard]] bool isUnwanted(const Shape& shape, const char* selector) const noexcept;
+    [[nodiscard]] bool isUnwanted(const Known& known, const char* selector) const noexcept {
+        return isUnwanted(known.newer, selector) || isUnwanted(known.older, selector);
+    }
     [[nodiscard]] static std::array<char, Longest> padded(std::string_view bytes) noexcept;
     [[nodiscard]] static std::size_t slotOf(std::uint64_t routeWord) noexcept {
         return (routeWord * 0x9E3779B97F4A7C15ULL) >> 52U;
     }
     void learn(std::string_view selector, std::string_view route);
 
-    std::array<Shape, Longest + 1> _shapes; // by length of the selector
-    std::array<bool, Slots> _wanted{};      // by the slot of a wanted route's word
+    std::array<Known, Longest + 1> _known; // by length of the selector
+    std::array<bool, Slots> _wanted{};     // by the slot of a wanted route's word
 };
 
 } // namespace orvo

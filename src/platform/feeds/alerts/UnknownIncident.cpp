@@ -62,9 +62,6 @@ std::shared_ptr<FeedTransitIncident> makeUnknownIncident(const UnknownLine& line
     fields.title = words.statusUnknown();
     fields.summary = words.lastKnown(line.systemName, age);
     fields.fullDescription = *fields.summary + "\n\n" + reasonInWords(status, words);
-    fields.messageForRoutePlanning = fields.title;
-    fields.messageForRouteStepping = fields.title;
-    fields.messageForNonRoutable = fields.title;
     fields.iconType = static_cast<std::int32_t>(IncidentEffect::UnknownEffect);
     fields.affectedEntities = NSArray::arrayOf(
         {FeedAffectedEntity::initWithMuid_stops_firstStop_endStop(line.muid, nullptr, 0, 0)});

@@ -66,6 +66,8 @@ public:
         _position = skim(_position, _end);
     }
 
+    /// Where the next field begins, or the message ends.
+    [[nodiscard]] const char* position() const noexcept { return _position; }
     /// Of the current field.
     [[nodiscard]] Key key() const noexcept { return _key; }
     [[nodiscard]] std::uint32_t field() const noexcept { return _key >> 3U; }

@@ -1,5 +1,6 @@
 #include "platform/feeds/alerts/ConcernedLines.h"
 
+#include "AlertMaker.h"
 #include "TestLines.h"
 
 #include <gtest/gtest.h>
@@ -25,7 +26,7 @@ AlertSelector agency(std::string_view id) {
 /// behind `#` the alerts that name the line.
 std::string concerned(const std::vector<std::vector<AlertSelector>>& alerts) {
     const auto index = smallIndex();
-    const LineTable table(*index);
+    const LineTable table(index);
     AlertStatistics statistics;
     SelectorResolver resolver(table, statistics);
     std::vector<Alert> made(alerts.size());
@@ -64,7 +65,7 @@ TEST(ConcernedLines, SelectorsThatNameMillionsOfLinesTogetherAreLostAndCounted) 
         line.muid = lineMuid("town", line.routeId);
         line.agencyId = "A";
     }
-    const LineIndex index(std::move(contents));
+    const auto index = std::make_shared<const LineIndex>(std::move(contents));
     const LineTable table(index);
     AlertStatistics statistics;
     SelectorResolver resolver(table, statistics);
@@ -109,9 +110,34 @@ TEST(ConcernedLines, WithoutSelectorsThereAreNone) {
     EXPECT_EQ(concerned({}), "");
 }
 
+TEST(ConcernedLines, OfSelectorsThatWerePassedOverAreFoundOnDemand) {
+    const std::string fields =
+        Wire().bytes(5, route("R3")).bytes(5, route("R1")).bytes(5, route("R2")).str();
+    const LineTable table(smallIndex());
+    AlertStatistics statistics;
+    SelectorResolver resolver(table, statistics);
+    ConcernedLines lines(resolver);
+    Alert alert;
+    alert.selectors = {at("R1")};
+    alert.hasUnreadSelectors = true;
+    alert.selectorFields = fields;
+    Incident incident;
+    incident.members = {{&alert, 0}};
+    lines.find(incident);
+    EXPECT_FALSE(lines.areAll());
+    EXPECT_EQ(lines.lines().size(), 1U);
+    lines.findAll(incident);
+    EXPECT_TRUE(lines.areAll());
+    EXPECT_EQ(lines.lines().size(), 3U);
+    alert.selectors.push_back(agency("A2")); // its lines are the schedule's to say, now
+    lines.find(incident);
+    EXPECT_TRUE(lines.areAll());
+    EXPECT_EQ(lines.lines().size(), 3U);
+}
+
 TEST(ConcernedLines, OneObjectServesManyIncidents) {
     const auto index = smallIndex();
-    const LineTable table(*index);
+    const LineTable table(index);
     AlertStatistics statistics;
     SelectorResolver resolver(table, statistics);
     ConcernedLines lines(resolver);

@@ -1,6 +1,7 @@
 #include "platform/feeds/alerts/EntityReader.h"
 
 #include "AlertMaker.h"
+#include "platform/feeds/alerts/SelectorShapes.h"
 
 #include <gtest/gtest.h>
 
@@ -14,9 +15,9 @@ struct Reading {
     AlertStatistics statistics;
     AlertReading reading;
 
-    explicit Reading(const Wire& entity)
+    explicit Reading(const Wire& entity, const SelectorShapes* passedOver = nullptr)
         : bytes(entity.str())
-        , reading(EntityReader(statistics).read(bytes)) {}
+        , reading(EntityReader(statistics, passedOver).read(bytes)) {}
     Reading(const Reading&) = delete;
     Reading& operator=(const Reading&) = delete;
     ~Reading() = default;
@@ -35,6 +36,18 @@ AlertMaker withSelector(const Wire& selector) {
     AlertMaker maker;
     maker.selectors = {selector, route("R2")};
     return maker;
+}
+
+std::string routesOf(const std::vector<AlertSelector>& selectors) {
+    std::string text;
+    for (const AlertSelector& selector : selectors)
+        text += (text.empty() ? "" : " ") + std::string(selector.routeId);
+    return text;
+}
+
+/// Of a form that can be recognised.
+Wire ofAgency(std::string_view line) {
+    return Wire().bytes(1, "A1").bytes(2, line);
 }
 
 const std::string BadText = "caf\xE9";
@@ -313,6 +326,58 @@ TEST(EntityReader, AnAlertGivenInTwoPartsIsOne) {
     const Reading read(AlertMaker().entity().bytes(5, second.alert()));
     EXPECT_EQ(read.alert().selectors.size(), 2U);
     EXPECT_EQ(read.alert().header.size(), 1U);
+}
+
+TEST(EntityReader, SelectorsOfNoInterestAreKeptAsTheyCame) {
+    SelectorShapes shapes;
+    shapes.want("R1");
+    static_cast<void>(shapes.routeOf(ofAgency("R9").str()));
+    AlertMaker maker;
+    maker.activePeriods = {period(1, 2)};
+    maker.selectors = {ofAgency("R7"), ofAgency("R1"), ofAgency("R8")};
+    const Reading read(maker.entity(), &shapes);
+    EXPECT_EQ(routesOf(read.alert().selectors), "R1");
+    EXPECT_TRUE(read.alert().hasUnreadSelectors);
+    std::vector<AlertSelector> all;
+    EntityReader::readSelectors(read.alert().selectorFields, all);
+    EXPECT_EQ(routesOf(all), "R7 R1 R8");
+    EXPECT_EQ(read.alert().activePeriods.size(), 1U);
+    EXPECT_EQ(read.alert().header.size(), 1U);
+}
+
+TEST(EntityReader, OtherFieldsAmongSelectorsOfNoInterestAreRead) {
+    SelectorShapes shapes;
+    static_cast<void>(shapes.routeOf(ofAgency("R9").str()));
+    AlertMaker maker;
+    maker.more.bytes(5, ofAgency("R6")).bytes(5, ofAgency("R7"));
+    maker.more.number(14, 4).bytes(5, ofAgency("R8")).bytes(5, Wire());
+    const Reading read(maker.entity(), &shapes);
+    EXPECT_TRUE(read.alert().hasUnreadSelectors);
+    EXPECT_EQ(read.alert().severity, 4);
+    std::vector<AlertSelector> all;
+    EntityReader::readSelectors(read.alert().selectorFields, all);
+    EXPECT_EQ(routesOf(all), "R1 R6 R7 R8");
+}
+
+TEST(EntityReader, WithNothingPassedOverNoneIsUnread) {
+    SelectorShapes shapes;
+    const AlertMaker maker;
+    const Reading read(maker.entity(), &shapes);
+    EXPECT_FALSE(read.alert().hasUnreadSelectors);
+    EXPECT_EQ(routesOf(read.alert().selectors), "R1");
+}
+
+TEST(EntityReader, AnAlertGivenInTwoPartsIsReadWhole) {
+    SelectorShapes shapes;
+    static_cast<void>(shapes.routeOf(ofAgency("R9").str()));
+    AlertMaker maker;
+    maker.activePeriods = {period(1, 2)};
+    maker.selectors = {ofAgency("R7"), ofAgency("R8")};
+    Wire entity = maker.entity();
+    const Reading read(entity.bytes(5, Wire().bytes(5, ofAgency("R6")).bytes(5, ofAgency("R5"))),
+                       &shapes);
+    EXPECT_FALSE(read.alert().hasUnreadSelectors);
+    EXPECT_EQ(routesOf(read.alert().selectors), "R7 R8 R6 R5");
 }
 
 TEST(EntityReader, ExtensionsAreSteppedOver) {

@@ -86,6 +86,19 @@ TEST(IncidentMerger, OneIdentifierForDifferentTextsOfOneLanguageMeansDifferentIn
               2U);
 }
 
+TEST(IncidentMerger, ATranslationJoinsTheFirstOfItsIdentifierThatLacksItsLanguage) {
+    std::deque<Alert> alerts = {alert("1", {{"One", "en"}, {"Un", "fr"}}),
+                                alert("1", {{"Two", "en"}, {"Deux", "fr"}}),
+                                alert("1", {{"Three", "en"}}),
+                                alert("1", {{"Four", "en"}}),
+                                alert("1", {{"Trois", "fr"}}),
+                                alert("1", {{"Quatre", "fr"}})};
+    const auto incidents = merge(alerts);
+    ASSERT_EQ(incidents.size(), 4U);
+    EXPECT_EQ(incidents[2].header.at(1).text, "Trois");
+    EXPECT_EQ(incidents[3].header.at(1).text, "Quatre");
+}
+
 TEST(IncidentMerger, WithoutAnIdentifierNothingIsATranslation) {
     EXPECT_EQ(count({alert("", {{"Delay", "en"}}), alert("", {{"Retard", "fr"}})}), 2U);
 }

@@ -32,7 +32,16 @@ std::optional<IncidentPeriod> published(std::optional<std::uint64_t> start,
 }
 
 Periods shown(Periods periods, double now = At) {
-    return IncidentPeriods::currentAndComing(std::move(periods), now);
+    IncidentPeriods::keepCurrentAndComing(periods, now);
+    return periods;
+}
+
+Periods ofAlert(const Alert& alert) {
+    Periods periods = {{7, 8}}; // what is there stays
+    IncidentPeriods::addOfAlert(alert, periods);
+    EXPECT_EQ(periods.front(), (IncidentPeriod{7, 8}));
+    periods.erase(periods.begin());
+    return periods;
 }
 
 } // namespace
@@ -81,23 +90,23 @@ TEST(IncidentPeriods, EmptyOnesAndThoseThatNeverBeginAreNone) {
 TEST(IncidentPeriods, ImpactComesBeforeCommunicationBeforeActive) {
     Alert alert;
     alert.activePeriods = {{1, 2}};
-    EXPECT_EQ(IncidentPeriods::ofAlert(alert), (Periods{{1, 2}}));
+    EXPECT_EQ(ofAlert(alert), (Periods{{1, 2}}));
     alert.communicationPeriods = {{3, 4}};
-    EXPECT_EQ(IncidentPeriods::ofAlert(alert), (Periods{{3, 4}}));
+    EXPECT_EQ(ofAlert(alert), (Periods{{3, 4}}));
     alert.impactPeriods = {{5, 6}};
-    EXPECT_EQ(IncidentPeriods::ofAlert(alert), (Periods{{5, 6}}));
+    EXPECT_EQ(ofAlert(alert), (Periods{{5, 6}}));
     alert.communicationPeriods.clear();
-    EXPECT_EQ(IncidentPeriods::ofAlert(alert), (Periods{{5, 6}}));
+    EXPECT_EQ(ofAlert(alert), (Periods{{5, 6}}));
 }
 
 TEST(IncidentPeriods, WithoutAnyItHoldsAsLongAsItIsInTheFeed) {
-    EXPECT_EQ(IncidentPeriods::ofAlert(Alert{}), (Periods{{Open, Open}}));
+    EXPECT_EQ(ofAlert(Alert{}), (Periods{{Open, Open}}));
 }
 
 TEST(IncidentPeriods, OnlyEmptyOnesMeanNever) {
     Alert alert;
     alert.activePeriods = {{10, 9}};
-    EXPECT_TRUE(IncidentPeriods::ofAlert(alert).empty());
+    EXPECT_TRUE(ofAlert(alert).empty());
 }
 
 TEST(IncidentPeriods, TheEarliestStartIsOfThePeriodsThatCount) {

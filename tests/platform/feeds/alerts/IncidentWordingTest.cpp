@@ -20,7 +20,7 @@ struct Example {
 
     IncidentTexts texts() const {
         const auto index = smallIndex();
-        const LineTable table(*index);
+        const LineTable table(index);
         AlertStatistics statistics;
         SelectorResolver resolver(table, statistics);
         ConcernedLines lines(resolver);

@@ -27,7 +27,7 @@ std::string preparedRoute(std::uint64_t number) {
 
 TEST(LineTable, NamesLinesByTheirPlaceInTheSchedule) {
     const auto index = smallIndex();
-    const LineTable table(*index);
+    const LineTable table(index);
     EXPECT_EQ(table.count(), 5U);
     EXPECT_EQ(table.placeOfRoute("R2"), 1U);
     EXPECT_EQ(table.placeOfRoute(" R2 "), 1U);
@@ -50,9 +50,9 @@ TEST(LineTable, RoutesThatWerePreparedToHaveOneHashCostNoMoreThanOthers) {
     }
     ASSERT_EQ(ByteScan::quickHash(contents.lines.front().routeId),
               ByteScan::quickHash(contents.lines.back().routeId));
-    const LineIndex index(std::move(contents));
+    const auto index = std::make_shared<const LineIndex>(std::move(contents));
     const LineTable table(index);
-    EXPECT_EQ(table.placeOfRoute(index.lines().back().routeId), Lines - 1);
+    EXPECT_EQ(table.placeOfRoute(index->lines().back().routeId), Lines - 1);
     // With one slot for all of them it would be as many as there are lines.
     EXPECT_LT(table.longestProbe(), Lines / 100);
 }

@@ -19,7 +19,7 @@ struct Resolved {
 Resolved resolve(const AlertSelector& selector) {
     Resolved resolved;
     const auto index = smallIndex();
-    const LineTable table(*index);
+    const LineTable table(index);
     SelectorResolver resolver(table, resolved.statistics);
     SelectorResolver::Places places;
     resolver.resolve(selector, places);
@@ -85,7 +85,7 @@ TEST(SelectorResolver, AStopThatTheScheduleCannotBeAskedAboutIsLostAndNotUnserve
         ++asked;
         return std::nullopt;
     };
-    const LineIndex index(std::move(contents));
+    const auto index = std::make_shared<const LineIndex>(std::move(contents));
     const LineTable table(index);
     AlertStatistics statistics;
     SelectorResolver resolver(table, statistics);
@@ -105,7 +105,7 @@ TEST(SelectorResolver, AStopThatTheScheduleCannotBeAskedAboutIsLostAndNotUnserve
 TEST(SelectorResolver, AnAgencyThatTheScheduleLeavesBlankContradictsNothing) {
     auto contents = smallSchedule();
     contents.lines[0].agencyId.clear();
-    const LineIndex index(std::move(contents));
+    const auto index = std::make_shared<const LineIndex>(std::move(contents));
     const LineTable table(index);
     AlertStatistics statistics;
     SelectorResolver resolver(table, statistics);

@@ -111,6 +111,16 @@ TEST(SelectorShapes, OfOneLengthButAnotherFormIsNotPassedOver) {
     }
 }
 
+TEST(SelectorShapes, TwoFormsOfOneLengthAreKnownAndAThirdTakesThePlaceOfTheOlder) {
+    const Wire one = usual("A1", "R9999", "S1");
+    const Wire two = usual("A1", "R999", "S12");
+    const Wire three = usual("A1", "R99", "S123");
+    EXPECT_EQ(skimmed({one, two, one}, {one, two}), 3U);
+    EXPECT_EQ(skimmed({one, two, one}, {one, two, one, one}), 3U);
+    EXPECT_EQ(skimmed({three, two, one}, {one, two, three}), 2U);
+    EXPECT_EQ(skimmed({two, usual("A1", "R123", "S12")}, {one, two}, {"R123"}), 1U);
+}
+
 TEST(SelectorShapes, CutAtEveryByteItNeverReadsOn) {
     SelectorShapes shapes;
     static_cast<void>(shapes.routeOf(usual("A1", "R9999", "S1").str()));
