@@ -3,7 +3,7 @@
 _orvo_transit_widget() {
     local line=${COMP_LINE:0:COMP_POINT} previous=$3 place= word skip= demo=
     local current=${line##* }
-    local -i operands=0
+    local -a operands=()
     COMPREPLY=()
     for word in "${COMP_WORDS[@]:1:COMP_CWORD-1}"; do
         [[ $skip ]] && { skip=; continue; }
@@ -14,7 +14,7 @@ _orvo_transit_widget() {
         --at | --completion | --dump | --language | --max-rows | --mode | --open | --pictures | --print | --scale | --snapshot | --text-size | --width) skip=1; continue ;;
         -*) continue ;;
         esac
-        operands+=1
+        operands+=("$word")
     done
     case $place in
     '')

@@ -17,7 +17,7 @@ _orvo_words() {
 _orvo() {
     local line=${COMP_LINE:0:COMP_POINT} previous=$3 place= word skip= demo=
     local current=${line##* }
-    local -i operands=0
+    local -a operands=()
     COMPREPLY=()
     for word in "${COMP_WORDS[@]:1:COMP_CWORD-1}"; do
         [[ $skip ]] && { skip=; continue; }
@@ -34,7 +34,7 @@ _orvo() {
         'favorites') case $word in add|list|edit|move|remove) place="${place:+$place }$word"; continue ;; esac ;;
         'feeds') case $word in add|list|update|check|remove) place="${place:+$place }$word"; continue ;; esac ;;
         esac
-        operands+=1
+        operands+=("$word")
     done
     case $place in
     '') COMPREPLY=($(compgen -W 'incidents lines favorites feeds open show receive service analytics settings defaults demo completion help --help --version' -- "$current")) ;;
@@ -57,7 +57,7 @@ _orvo() {
         esac
         case $current in
         -*) COMPREPLY=($(compgen -W '--limit --json --demo --at --language --help' -- "$current")) ;;
-        *) case $operands in
+        *) case ${#operands[@]} in
             *) _orvo_words feeds ;;
             esac ;;
         esac ;;
@@ -70,7 +70,7 @@ _orvo() {
         esac
         case $current in
         -*) COMPREPLY=($(compgen -W '--place --location --demo --at --language --help' -- "$current")) ;;
-        *) case $operands in
+        *) case ${#operands[@]} in
             *) _orvo_words lines ;;
             esac ;;
         esac ;;
@@ -97,7 +97,7 @@ _orvo() {
         esac
         case $current in
         -*) COMPREPLY=($(compgen -W '--demo --at --language --help' -- "$current")) ;;
-        *) case $operands in
+        *) case ${#operands[@]} in
             0) _orvo_words favorites ;;
             1) COMPREPLY=($(compgen -W '' -- "$current")) ;;
             esac ;;
@@ -109,7 +109,7 @@ _orvo() {
         esac
         case $current in
         -*) COMPREPLY=($(compgen -W '--demo --at --language --help' -- "$current")) ;;
-        *) case $operands in
+        *) case ${#operands[@]} in
             *) _orvo_words favorites ;;
             esac ;;
         esac ;;
@@ -125,7 +125,7 @@ _orvo() {
         esac
         case $current in
         -*) COMPREPLY=($(compgen -W '--static --alerts --header --query --user --replace --demo --at --language --help' -- "$current")) ;;
-        *) case $operands in
+        *) case ${#operands[@]} in
             0) COMPREPLY=($(compgen -W '' -- "$current")) ;;
             esac ;;
         esac ;;
@@ -144,7 +144,7 @@ _orvo() {
         esac
         case $current in
         -*) COMPREPLY=($(compgen -W '--force --demo --at --language --help' -- "$current")) ;;
-        *) case $operands in
+        *) case ${#operands[@]} in
             *) _orvo_words feeds ;;
             esac ;;
         esac ;;
@@ -155,7 +155,7 @@ _orvo() {
         esac
         case $current in
         -*) COMPREPLY=($(compgen -W '--json --demo --at --language --help' -- "$current")) ;;
-        *) case $operands in
+        *) case ${#operands[@]} in
             *) _orvo_words feeds ;;
             esac ;;
         esac ;;
@@ -166,7 +166,7 @@ _orvo() {
         esac
         case $current in
         -*) COMPREPLY=($(compgen -W '--demo --at --language --help' -- "$current")) ;;
-        *) case $operands in
+        *) case ${#operands[@]} in
             *) _orvo_words feeds ;;
             esac ;;
         esac ;;
@@ -177,7 +177,7 @@ _orvo() {
         esac
         case $current in
         -*) COMPREPLY=($(compgen -W '--demo --at --language --help' -- "$current")) ;;
-        *) case $operands in
+        *) case ${#operands[@]} in
             *) COMPREPLY=($(compgen -W '' -- "$current")) ;;
             esac ;;
         esac ;;
@@ -196,7 +196,7 @@ _orvo() {
         esac
         case $current in
         -*) COMPREPLY=($(compgen -W '--demo --at --language --help' -- "$current")) ;;
-        *) case $operands in
+        *) case ${#operands[@]} in
             0) COMPREPLY=($(compgen -W 'ContinueUserActivity' -- "$current")) ;;
             esac ;;
         esac ;;
@@ -225,7 +225,7 @@ _orvo() {
         esac
         case $current in
         -*) COMPREPLY=($(compgen -W '--json --demo --at --language --help' -- "$current")) ;;
-        *) case $operands in
+        *) case ${#operands[@]} in
             0) COMPREPLY=($(compgen -W 'step-free' -- "$current")) ;;
             1) COMPREPLY=($(compgen -W 'on off' -- "$current")) ;;
             esac ;;
@@ -237,8 +237,8 @@ _orvo() {
         esac
         case $current in
         -*) COMPREPLY=($(compgen -W '--json --demo --at --language --help' -- "$current")) ;;
-        *) case $operands in
-            0) COMPREPLY=($(compgen -W '' -- "$current")) ;;
+        *) case ${#operands[@]} in
+            0) COMPREPLY=($(compgen -W 'Orvo.TransitWidget.internal.injectFakeIncidents Orvo.TransitWidget.internal.randomNumberIncidents' -- "$current")) ;;
             esac ;;
         esac ;;
     'defaults write')
@@ -249,8 +249,8 @@ _orvo() {
         esac
         case $current in
         -*) COMPREPLY=($(compgen -W '--type --demo --at --language --help' -- "$current")) ;;
-        *) case $operands in
-            0) COMPREPLY=($(compgen -W '' -- "$current")) ;;
+        *) case ${#operands[@]} in
+            0) COMPREPLY=($(compgen -W 'Orvo.TransitWidget.internal.injectFakeIncidents Orvo.TransitWidget.internal.randomNumberIncidents' -- "$current")) ;;
             1) COMPREPLY=($(compgen -W '' -- "$current")) ;;
             esac ;;
         esac ;;
@@ -261,8 +261,8 @@ _orvo() {
         esac
         case $current in
         -*) COMPREPLY=($(compgen -W '--demo --at --language --help' -- "$current")) ;;
-        *) case $operands in
-            0) COMPREPLY=($(compgen -W '' -- "$current")) ;;
+        *) case ${#operands[@]} in
+            0) COMPREPLY=($(compgen -W 'Orvo.TransitWidget.internal.injectFakeIncidents Orvo.TransitWidget.internal.randomNumberIncidents' -- "$current")) ;;
             esac ;;
         esac ;;
     'demo')
@@ -272,7 +272,7 @@ _orvo() {
         esac
         case $current in
         -*) COMPREPLY=($(compgen -W '--serve --demo --at --language --help' -- "$current")) ;;
-        *) case $operands in
+        *) case ${#operands[@]} in
             0) COMPREPLY=($(compgen -W '' -- "$current")) ;;
             esac ;;
         esac ;;
@@ -283,7 +283,7 @@ _orvo() {
         esac
         case $current in
         -*) COMPREPLY=($(compgen -W '--demo --at --language --help' -- "$current")) ;;
-        *) case $operands in
+        *) case ${#operands[@]} in
             0) COMPREPLY=($(compgen -W 'bash zsh fish words' -- "$current")) ;;
             1) COMPREPLY=($(compgen -W 'feeds lines favorites' -- "$current")) ;;
             esac ;;
@@ -295,8 +295,11 @@ _orvo() {
         esac
         case $current in
         -*) COMPREPLY=($(compgen -W '--demo --at --language --help' -- "$current")) ;;
-        *) case $operands in
-            *) COMPREPLY=($(compgen -W '' -- "$current")) ;;
+        *) case "${operands[*]}" in
+            '') COMPREPLY=($(compgen -W 'incidents lines favorites feeds open show receive service analytics settings defaults demo completion help' -- "$current")) ;;
+            'defaults') COMPREPLY=($(compgen -W 'read write delete' -- "$current")) ;;
+            'favorites') COMPREPLY=($(compgen -W 'add list edit move remove' -- "$current")) ;;
+            'feeds') COMPREPLY=($(compgen -W 'add list update check remove' -- "$current")) ;;
             esac ;;
         esac ;;
     esac

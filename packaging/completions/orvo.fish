@@ -161,19 +161,19 @@ complete -c orvo -n '__orvo_at defaults read' -l demo -d 'use the demonstration 
 complete -c orvo -n '__orvo_at defaults read' -l at -d 'answer for that moment, as 2024-07-24T01:28:40Z; nothing is written' -r -f
 complete -c orvo -n '__orvo_at defaults read' -l language -d 'the language to prefer in texts, as de or pt-BR' -r -f
 complete -c orvo -n '__orvo_at defaults read' -l help -d 'show this text' -f
-complete -c orvo -n '__orvo_after 0 defaults read' -f
+complete -c orvo -n '__orvo_after 0 defaults read' -f -a 'Orvo.TransitWidget.internal.injectFakeIncidents Orvo.TransitWidget.internal.randomNumberIncidents'
 complete -c orvo -n '__orvo_at defaults write' -l type -d 'read VALUE as bool, integer, real or string' -r -f -a 'bool integer real string'
 complete -c orvo -n '__orvo_at defaults write' -l demo -d 'use the demonstration city'\''s profile instead of your own' -f
 complete -c orvo -n '__orvo_at defaults write' -l at -d 'answer for that moment, as 2024-07-24T01:28:40Z; nothing is written' -r -f
 complete -c orvo -n '__orvo_at defaults write' -l language -d 'the language to prefer in texts, as de or pt-BR' -r -f
 complete -c orvo -n '__orvo_at defaults write' -l help -d 'show this text' -f
-complete -c orvo -n '__orvo_after 0 defaults write' -f
+complete -c orvo -n '__orvo_after 0 defaults write' -f -a 'Orvo.TransitWidget.internal.injectFakeIncidents Orvo.TransitWidget.internal.randomNumberIncidents'
 complete -c orvo -n '__orvo_after 1 defaults write' -f
 complete -c orvo -n '__orvo_at defaults delete' -l demo -d 'use the demonstration city'\''s profile instead of your own' -f
 complete -c orvo -n '__orvo_at defaults delete' -l at -d 'answer for that moment, as 2024-07-24T01:28:40Z; nothing is written' -r -f
 complete -c orvo -n '__orvo_at defaults delete' -l language -d 'the language to prefer in texts, as de or pt-BR' -r -f
 complete -c orvo -n '__orvo_at defaults delete' -l help -d 'show this text' -f
-complete -c orvo -n '__orvo_after 0 defaults delete' -f
+complete -c orvo -n '__orvo_after 0 defaults delete' -f -a 'Orvo.TransitWidget.internal.injectFakeIncidents Orvo.TransitWidget.internal.randomNumberIncidents'
 complete -c orvo -n '__orvo_at demo' -l serve -d 'serve live alerts over HTTP, to this machine only' -f
 complete -c orvo -n '__orvo_at demo' -l demo -d 'use the demonstration city'\''s profile instead of your own' -f
 complete -c orvo -n '__orvo_at demo' -l at -d 'answer for that moment, as 2024-07-24T01:28:40Z; nothing is written' -r -f
@@ -191,3 +191,30 @@ complete -c orvo -n '__orvo_at help' -l at -d 'answer for that moment, as 2024-0
 complete -c orvo -n '__orvo_at help' -l language -d 'the language to prefer in texts, as de or pt-BR' -r -f
 complete -c orvo -n '__orvo_at help' -l help -d 'show this text' -f
 complete -c orvo -n '__orvo_from 0 help' -f
+complete -c orvo -n '__orvo_after 0 help' -a incidents -d 'Show what is known now of the favourite lines'
+complete -c orvo -n '__orvo_after 0 help' -a lines -d 'Find lines in the schedules'
+complete -c orvo -n '__orvo_after 0 help' -a favorites -d 'favorites …'
+complete -c orvo -n '__orvo_after 0 help' -a feeds -d 'feeds …'
+complete -c orvo -n '__orvo_after 0 help' -a open -d 'Open a URL of the map application'
+complete -c orvo -n '__orvo_after 0 help' -a show -d 'Show what was handed over last'
+complete -c orvo -n '__orvo_after 0 help' -a receive -d 'Take what another program hands over'
+complete -c orvo -n '__orvo_after 0 help' -a service -d 'Serve the map application on the session bus'
+complete -c orvo -n '__orvo_after 0 help' -a analytics -d 'List what the widget recorded of its own use'
+complete -c orvo -n '__orvo_after 0 help' -a settings -d 'Show or change what you prefer'
+complete -c orvo -n '__orvo_after 0 help' -a defaults -d 'defaults …'
+complete -c orvo -n '__orvo_after 0 help' -a demo -d 'Write the demonstration city anew'
+complete -c orvo -n '__orvo_after 0 help' -a completion -d 'Print a shell'\''s completion script'
+complete -c orvo -n '__orvo_after 0 help' -a help -d 'Explain a command'
+complete -c orvo -n '__orvo_after 0 help defaults' -a read -d 'Show settings as they are kept'
+complete -c orvo -n '__orvo_after 0 help defaults' -a write -d 'Set one setting'
+complete -c orvo -n '__orvo_after 0 help defaults' -a delete -d 'Forget one setting'
+complete -c orvo -n '__orvo_after 0 help favorites' -a add -d 'Add lines, or a place, to the favourites'
+complete -c orvo -n '__orvo_after 0 help favorites' -a list -d 'List the favourites in their order'
+complete -c orvo -n '__orvo_after 0 help favorites' -a edit -d 'Edit the favourites in a window'
+complete -c orvo -n '__orvo_after 0 help favorites' -a move -d 'Give a favourite another place in the order'
+complete -c orvo -n '__orvo_after 0 help favorites' -a remove -d 'Remove favourites'
+complete -c orvo -n '__orvo_after 0 help feeds' -a add -d 'Add a feed: a schedule and its alerts'
+complete -c orvo -n '__orvo_after 0 help feeds' -a list -d 'List the feeds'
+complete -c orvo -n '__orvo_after 0 help feeds' -a update -d 'Import schedules anew'
+complete -c orvo -n '__orvo_after 0 help feeds' -a check -d 'Read the alerts now and say what they hold'
+complete -c orvo -n '__orvo_after 0 help feeds' -a remove -d 'Forget feeds'

@@ -2,6 +2,7 @@
 
 #include "fetching/DebugTransitIncident.h"
 #include "fetching/DebugTransitLineItem.h"
+#include "fetching/FakeIncidentKeys.h"
 #include "fetching/FavoritesContainer_OWFavorites.h"
 #include "fetching/_OWTransitIncidentFetcherRequest.h"
 #include "platform/favorites/FavoriteTransitLine.h"
@@ -17,10 +18,6 @@
 namespace orvo {
 
 namespace {
-
-constexpr const char* injectFakeIncidentsKey = "Orvo.TransitWidget.internal.injectFakeIncidents";
-constexpr const char* randomNumberIncidentsKey =
-    "Orvo.TransitWidget.internal.randomNumberIncidents";
 
 std::size_t countOf(const std::shared_ptr<NSArray>& array) {
     return array ? array->count() : 0;

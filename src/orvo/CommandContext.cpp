@@ -61,6 +61,11 @@ std::shared_ptr<ScheduleStore> CommandContext::schedules(std::shared_ptr<NSError
     return _schedules;
 }
 
+std::shared_ptr<ScheduleStore> CommandContext::schedulesIfReadable() {
+    std::shared_ptr<NSError> ignored;
+    return schedules(ignored);
+}
+
 const std::shared_ptr<FeedRegistry>& CommandContext::registry() {
     if (!_registry)
         _registry = FeedRegistry::open();

@@ -30,8 +30,10 @@ public:
     [[nodiscard]] const std::shared_ptr<FeedRegistry>& registry();
     /// Nil, with the reason in `error`, when it cannot be opened.
     [[nodiscard]] std::shared_ptr<ScheduleStore> schedules(std::shared_ptr<NSError>& error);
-    /// Likewise; also where the file is damaged and was set aside by that: it is not as if there
-    /// were no favourites.
+    /// The same for who can do without it: nil where it cannot be opened, whatever the reason.
+    [[nodiscard]] std::shared_ptr<ScheduleStore> schedulesIfReadable();
+    /// Nil, with the reason in `error`, when they cannot be opened; also where the file is damaged
+    /// and was set aside by that: it is not as if there were no favourites.
     [[nodiscard]] static std::shared_ptr<FavoritesStore> favorites(FavoritesStore::Access access,
                                                                    std::shared_ptr<NSError>& error);
 

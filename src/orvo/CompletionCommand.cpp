@@ -68,7 +68,7 @@ ExitCode CompletionCommand::printWords(const std::string& kind, CommandContext& 
         for (const auto& entry : store->entries(&error))
             printWord(output,
                       FavoriteReference::lineNameOf(*entry.favorite)
-                          .value_or(FavoriteReference::nameOf(*entry.favorite)));
+                          .value_or(FavoriteReference::nameOf(*entry.favorite, nullptr)));
         return error ? context.fail(*error) : ExitCode::Answered;
     }
     const auto schedules = context.schedules(error);

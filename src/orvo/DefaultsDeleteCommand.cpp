@@ -1,5 +1,6 @@
 #include "orvo/DefaultsDeleteCommand.h"
 
+#include "orvo/DefaultsValue.h"
 #include "shared/NSUserDefaults_OrvoGroup.h"
 
 #include <fmt/format.h>
@@ -10,7 +11,10 @@ CommandSpec DefaultsDeleteCommand::spec() const {
     return {.path = {"defaults", "delete"},
             .summary = "Forget one setting",
             .description = "",
-            .operands = {{.name = "KEY", .help = ""}},
+            .operands = {{.name = "KEY",
+                          .help = "",
+                          .completes = Completes::Suggestion,
+                          .words = DefaultsValue::knownKeys()}},
             .examples = {{"orvo defaults delete Orvo.TransitWidget.internal.injectFakeIncidents",
                           "back to real incidents"}}};
 }

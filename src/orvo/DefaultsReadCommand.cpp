@@ -33,7 +33,9 @@ CommandSpec DefaultsReadCommand::spec() const {
             .description = "",
             .operands = {{.name = "KEY",
                           .help = "one key; without it all",
-                          .count = OperandSpec::Count::Optional}},
+                          .count = OperandSpec::Count::Optional,
+                          .completes = Completes::Suggestion,
+                          .words = DefaultsValue::knownKeys()}},
             .options = {{"json", "", "print JSON"}},
             .examples = {{"orvo defaults read", "everything"}}};
 }

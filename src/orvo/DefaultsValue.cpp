@@ -1,5 +1,6 @@
 #include "orvo/DefaultsValue.h"
 
+#include "fetching/FakeIncidentKeys.h"
 #include "platform/foundation/NSArray.h"
 #include "platform/foundation/NSData.h"
 #include "platform/foundation/NSNumber.h"
@@ -42,6 +43,11 @@ std::shared_ptr<NSObject> real(const std::string& text) {
 const std::vector<std::string>& kinds() {
     static const std::vector<std::string> kinds = {"bool", "integer", "real", "string"};
     return kinds;
+}
+
+const std::vector<std::string>& knownKeys() {
+    static const std::vector<std::string> keys = {injectFakeIncidentsKey, randomNumberIncidentsKey};
+    return keys;
 }
 
 std::shared_ptr<NSObject> parse(const std::string& text, const std::string& kind) {

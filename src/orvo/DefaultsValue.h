@@ -7,11 +7,15 @@
 #include <string>
 #include <vector>
 
-/// Values of the user defaults as a person writes and reads them.
+/// Keys and values of the user defaults as a person writes and reads them.
 namespace orvo::DefaultsValue {
 
 /// The kinds that a person can write.
 [[nodiscard]] const std::vector<std::string>& kinds();
+
+/// The keys that mean something to the widget, and which no other command sets. Others are
+/// permitted.
+[[nodiscard]] const std::vector<std::string>& knownKeys();
 
 /// The value that `text` stands for: a truth value for `true`, `false`, `yes`, `no`, a number for a
 /// number, else the text. With a kind of `kinds()` only that kind: nil when the text is none.

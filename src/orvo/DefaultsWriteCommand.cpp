@@ -15,7 +15,10 @@ CommandSpec DefaultsWriteCommand::spec() const {
                        "Orvo.TransitWidget.internal.injectFakeIncidents makes up incidents for "
                        "lines without any, and Orvo.TransitWidget.internal.randomNumberIncidents "
                        "makes up none, one or two of them.",
-        .operands = {{.name = "KEY", .help = ""},
+        .operands = {{.name = "KEY",
+                      .help = "",
+                      .completes = Completes::Suggestion,
+                      .words = DefaultsValue::knownKeys()},
                      {.name = "VALUE",
                       .help = "true, false, yes and no are truth values, numbers are numbers, all "
                               "else text"}},

@@ -3,7 +3,6 @@
 #include "orvo/FavoriteReference.h"
 #include "orvo/JsonParts.h"
 #include "orvo/console/TextTable.h"
-#include "platform/favorites/FavoriteTransitLine.h"
 #include "platform/favorites/StoredTransitLine.h"
 
 #include <fmt/format.h>
@@ -13,17 +12,12 @@ namespace orvo {
 
 namespace {
 
-std::shared_ptr<TransitLine> lineOf(const NSObject& favorite) {
-    const auto* line = dynamic_cast<const FavoriteTransitLine*>(&favorite);
-    return line ? line->transitLine() : nullptr;
-}
-
 std::optional<std::string> systemName(const TransitLine& line) {
     return line.system() ? line.system()->name() : std::nullopt;
 }
 
-void addFavorite(JsonWriter& json, const NSObject& favorite) {
-    if (const auto line = lineOf(favorite)) {
+void addFavorite(JsonWriter& json, const NSObject& favorite, const ScheduleStore* schedules) {
+    if (const auto line = FavoriteReference::lineOf(favorite, schedules)) {
         const auto origin = StoredTransitLine::originOf(*line);
         json.key("kind").value("line");
         json.key("feed").value(origin ? std::optional(origin->feed) : std::nullopt);
@@ -40,12 +34,13 @@ void addFavorite(JsonWriter& json, const NSObject& favorite) {
 }
 
 std::string json(const std::vector<FavoritesStore::Entry>& entries,
+                 const ScheduleStore* schedules,
                  const std::shared_ptr<NSError>& error) {
     JsonWriter json;
     json.beginObject().key("favorites").beginArray();
     for (const auto& entry : entries) {
         json.beginObject();
-        addFavorite(json, *entry.favorite);
+        addFavorite(json, *entry.favorite, schedules);
         json.endObject();
     }
     json.endArray();
@@ -53,14 +48,15 @@ std::string json(const std::vector<FavoritesStore::Entry>& entries,
     return json.endObject().text();
 }
 
-std::vector<std::string> row(std::size_t number, const NSObject& favorite) {
+std::vector<std::string>
+row(std::size_t number, const NSObject& favorite, const ScheduleStore* schedules) {
     const auto* place = dynamic_cast<const FavoritePlace*>(&favorite);
-    const auto line = lineOf(favorite);
+    const auto line = FavoriteReference::lineOf(favorite, schedules);
     const std::string where =
         place ? fmt::format("{:.5g}, {:.5g}", place->latitude(), place->longitude()) : "";
     return {fmt::format("{}", number),
             FavoriteReference::lineNameOf(favorite).value_or(place ? "(place)" : ""),
-            FavoriteReference::nameOf(favorite),
+            FavoriteReference::nameOf(favorite, schedules),
             line ? systemName(*line).value_or("") : where};
 }
 
@@ -69,7 +65,9 @@ std::vector<std::string> row(std::size_t number, const NSObject& favorite) {
 CommandSpec FavoritesListCommand::spec() const {
     return {.path = {"favorites", "list"},
             .summary = "List the favourites in their order",
-            .description = "",
+            .description = "Lines have the names that their schedules have for them now, in your "
+                           "language; where there is no schedule, those that they had when they "
+                           "were added.",
             .options = {{"json", "", "print JSON"}},
             .examples = {{"orvo favorites list", "numbers, lines and places"}}};
 }
@@ -79,8 +77,9 @@ ExitCode FavoritesListCommand::run(const Arguments& arguments, CommandContext& c
     std::vector<FavoritesStore::Entry> entries;
     if (const auto store = CommandContext::favorites(FavoritesStore::Access::Read, error))
         entries = store->entries(&error);
+    const auto schedules = entries.empty() ? nullptr : context.schedulesIfReadable();
     if (arguments.has("json"))
-        context.terminal().output() << json(entries, error);
+        context.terminal().output() << json(entries, schedules.get(), error);
     if (error)
         return context.fail(*error);
     if (arguments.has("json"))
@@ -94,7 +93,7 @@ ExitCode FavoritesListCommand::run(const Arguments& arguments, CommandContext& c
                      {"Name"},
                      {"System"}});
     for (std::size_t i = 0; i < entries.size(); ++i)
-        table.addRow(row(i + 1, *entries[i].favorite));
+        table.addRow(row(i + 1, *entries[i].favorite, schedules.get()));
     table.print(context.terminal());
     return ExitCode::Answered;
 }

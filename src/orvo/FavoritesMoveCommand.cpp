@@ -10,15 +10,18 @@
 namespace orvo {
 
 CommandSpec FavoritesMoveCommand::spec() const {
-    return {.path = {"favorites", "move"},
-            .summary = "Give a favourite another place in the order",
-            .description = "",
-            .operands = {{.name = "FAVORITE",
-                          .help = "its number in the list, FEED:ROUTE_ID, or its name",
-                          .completes = Completes::Favorite},
-                         {.name = "POSITION",
-                          .help = "the number that it will have; beyond the last is the last"}},
-            .examples = {{"orvo favorites move city:T4 1", "to the top"}}};
+    return {
+        .path = {"favorites", "move"},
+        .summary = "Give a favourite another place in the order",
+        .description = "",
+        .operands = {{.name = "FAVORITE",
+                      .help =
+                          "its number in the list, FEED:ROUTE_ID, or its name, also the one that "
+                          "it had when it was added",
+                      .completes = Completes::Favorite},
+                     {.name = "POSITION",
+                      .help = "the number that it will have; beyond the last is the last"}},
+        .examples = {{"orvo favorites move city:T4 1", "to the top"}}};
 }
 
 ExitCode FavoritesMoveCommand::run(const Arguments& arguments, CommandContext& context) {
@@ -36,15 +39,18 @@ ExitCode FavoritesMoveCommand::run(const Arguments& arguments, CommandContext& c
     const auto entries = store->entries(&error);
     if (error)
         return context.fail(*error);
-    const auto answer = FavoriteReference::resolve(entries, arguments.operands()[0]);
+    const auto schedules = context.schedulesIfReadable();
+    const auto answer =
+        FavoriteReference::resolve(entries, arguments.operands()[0], schedules.get());
     if (!answer.index)
-        return context.fail(answer.message, "See: orvo favorites list");
+        return context.fail(answer.message, answer.cure);
     const auto& entry = entries[*answer.index];
     if ((error = store->move(entry.number, number - 1)))
         return context.fail(*error);
-    context.terminal().output() << fmt::format("{} is number {} now\n",
-                                               FavoriteReference::nameOf(*entry.favorite),
-                                               std::min(number, entries.size()));
+    context.terminal().output() << fmt::format(
+        "{} is number {} now\n",
+        FavoriteReference::nameOf(*entry.favorite, schedules.get()),
+        std::min(number, entries.size()));
     return ExitCode::Answered;
 }
 

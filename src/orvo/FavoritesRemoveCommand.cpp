@@ -8,14 +8,17 @@
 namespace orvo {
 
 CommandSpec FavoritesRemoveCommand::spec() const {
-    return {.path = {"favorites", "remove"},
-            .summary = "Remove favourites",
-            .description = "Either all that are named are found, or none is removed.",
-            .operands = {{.name = "FAVORITE",
-                          .help = "its number in the list, FEED:ROUTE_ID, or its name",
-                          .count = OperandSpec::Count::OneOrMore,
-                          .completes = Completes::Favorite}},
-            .examples = {{"orvo favorites remove city:T4 Home", "a line and a place"}}};
+    return {
+        .path = {"favorites", "remove"},
+        .summary = "Remove favourites",
+        .description = "Either all that are named are found, or none is removed.",
+        .operands = {{.name = "FAVORITE",
+                      .help =
+                          "its number in the list, FEED:ROUTE_ID, or its name, also the one that "
+                          "it had when it was added",
+                      .count = OperandSpec::Count::OneOrMore,
+                      .completes = Completes::Favorite}},
+        .examples = {{"orvo favorites remove city:T4 Home", "a line and a place"}}};
 }
 
 ExitCode FavoritesRemoveCommand::run(const Arguments& arguments, CommandContext& context) {
@@ -26,11 +29,12 @@ ExitCode FavoritesRemoveCommand::run(const Arguments& arguments, CommandContext&
     const auto entries = store->entries(&error);
     if (error)
         return context.fail(*error);
+    const auto schedules = context.schedulesIfReadable();
     std::vector<std::size_t> chosen;
     for (const auto& name : arguments.operands()) {
-        const auto answer = FavoriteReference::resolve(entries, name);
+        const auto answer = FavoriteReference::resolve(entries, name, schedules.get());
         if (!answer.index)
-            return context.fail(answer.message, "See: orvo favorites list");
+            return context.fail(answer.message, answer.cure);
         if (std::ranges::count(chosen, *answer.index) == 0)
             chosen.push_back(*answer.index);
     }
@@ -38,7 +42,8 @@ ExitCode FavoritesRemoveCommand::run(const Arguments& arguments, CommandContext&
         if ((error = store->remove(entries[index].number)))
             return context.fail(*error);
         context.terminal().output()
-            << "Removed " << FavoriteReference::nameOf(*entries[index].favorite) << '\n';
+            << "Removed " << FavoriteReference::nameOf(*entries[index].favorite, schedules.get())
+            << '\n';
     }
     return ExitCode::Answered;
 }

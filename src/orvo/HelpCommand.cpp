@@ -10,7 +10,8 @@ CommandSpec HelpCommand::spec() const {
             .description = "",
             .operands = {{.name = "COMMAND",
                           .help = "its words; without them all commands are listed",
-                          .count = OperandSpec::Count::Any}},
+                          .count = OperandSpec::Count::Any,
+                          .completes = Completes::Command}},
             .examples = {{"orvo help feeds add", "the same as orvo feeds add --help"}}};
 }
 

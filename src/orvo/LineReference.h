@@ -2,9 +2,11 @@
 
 #include "platform/feeds/schedule/ScheduleStore.h"
 
+#include <cstddef>
 #include <optional>
 #include <string>
 #include <string_view>
+#include <vector>
 
 /// How a person names a line: `FEED:ROUTE_ID`, or a short or long name that only one line has.
 namespace orvo::LineReference {
@@ -16,6 +18,11 @@ struct Answer {
 };
 
 [[nodiscard]] Answer resolve(const ScheduleStore& schedules, const std::string& text);
+
+/// `Did you mean city:H1 (Old Harbour)?`; empty for no lines. What is of no feed has its name only.
+[[nodiscard]] std::string didYouMean(const std::vector<ScheduleLine>& lines);
+/// So many lines are named at most where one may have been meant.
+inline constexpr std::size_t MostMeant = 3;
 
 /// What to do where no feed has a schedule, a sentence.
 inline constexpr const char* NoScheduleCure =

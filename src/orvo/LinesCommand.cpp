@@ -100,24 +100,34 @@ std::string json(const Found& found, const std::shared_ptr<NSError>& error) {
     return json.endObject().text();
 }
 
+/// With the lines that may have been meant.
+std::string noMatch(const std::string& search, const ScheduleStore& schedules) {
+    const auto meant =
+        LineReference::didYouMean(schedules.linesNear(search, LineReference::MostMeant));
+    return fmt::format("No line matches {}.{}{}", search, meant.empty() ? "" : " ", meant);
+}
+
 } // namespace
 
 CommandSpec LinesCommand::spec() const {
-    return {.path = {"lines"},
-            .summary = "Find lines in the schedules",
-            .description = fmt::format(
-                "Looks for the words in short names, long names and the names of agencies, best "
-                "match first. Case and accents do not count. The first column is what favorites "
-                "add takes. Of a search the best {} are shown, of a feed all lines.",
-                StandardLimit),
-            .operands = {{.name = "SEARCH",
-                          .help = "words, or the name of a feed for all its lines",
-                          .count = OperandSpec::Count::OneOrMore,
-                          .completes = Completes::Feed}},
-            .options = {{"limit", "N", "show at most so many lines; 0 for all"},
-                        {"json", "", "print JSON: the lines, and in total how many there are"}},
-            .examples = {{"orvo lines harbour", "lines whose names speak of a harbour"},
-                         {"orvo lines city", "all lines of the feed city"}}};
+    return {
+        .path = {"lines"},
+        .summary = "Find lines in the schedules",
+        .description = fmt::format(
+            "Looks for the words in short names, long names and the names of agencies, best "
+            "match first. Case and accents do not count. The first column is what favorites "
+            "add takes. Of a search the best {} are shown, of a feed all lines. Where nothing is "
+            "found, also for want of a schedule, that is the answer: the exit code is 0, and "
+            "the list of --json is empty.",
+            StandardLimit),
+        .operands = {{.name = "SEARCH",
+                      .help = "words, or the name of a feed for all its lines",
+                      .count = OperandSpec::Count::OneOrMore,
+                      .completes = Completes::Feed}},
+        .options = {{"limit", "N", "show at most so many lines; 0 for all"},
+                    {"json", "", "print JSON: the lines, and in total how many there are"}},
+        .examples = {{"orvo lines harbour", "lines whose names speak of a harbour"},
+                     {"orvo lines city", "all lines of the feed city"}}};
 }
 
 ExitCode LinesCommand::run(const Arguments& arguments, CommandContext& context) {
@@ -145,8 +155,11 @@ ExitCode LinesCommand::run(const Arguments& arguments, CommandContext& context) 
     const bool hasFeeds = !schedules->feeds(&error).empty();
     if (error)
         return context.fail(*error);
-    if (!hasFeeds)
-        return context.fail("there is no schedule yet", LineReference::NoScheduleCure);
+    if (!hasFeeds) {
+        context.terminal().note(
+            fmt::format("There is no schedule yet. {}", LineReference::NoScheduleCure));
+        return ExitCode::Answered;
+    }
     TextTable table({{"Line", TextTable::Column::Alignment::Left, false},
                      {"Short", TextTable::Column::Alignment::Left, false},
                      {"Name"},
@@ -159,7 +172,7 @@ ExitCode LinesCommand::run(const Arguments& arguments, CommandContext& context) 
                       line.agency.name,
                       modeOf(line)});
     if (found.lines.empty())
-        context.terminal().note(fmt::format("No line matches {}.", search));
+        context.terminal().note(noMatch(search, *schedules));
     else
         table.print(context.terminal());
     context.terminal().output().flush();

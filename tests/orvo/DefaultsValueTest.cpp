@@ -14,6 +14,12 @@ std::shared_ptr<NSObject> parsed(const char* text, const char* kind = "") {
     return DefaultsValue::parse(text, kind);
 }
 
+TEST(DefaultsValue, TheKnownKeysAreThoseOfMadeUpIncidents) {
+    EXPECT_EQ(DefaultsValue::knownKeys(),
+              (std::vector<std::string>{"Orvo.TransitWidget.internal.injectFakeIncidents",
+                                        "Orvo.TransitWidget.internal.randomNumberIncidents"}));
+}
+
 TEST(DefaultsValue, TrueFalseYesAndNoAreTruthValues) {
     for (const char* text : {"true", "yes"})
         EXPECT_TRUE(equal(parsed(text), NSNumber::numberWithBool(true))) << text;

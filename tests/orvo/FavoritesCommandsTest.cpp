@@ -33,6 +33,100 @@ TEST_F(FavoritesCommandsTest, ANameOfSeveralLinesIsRefusedWithTheChoice) {
     EXPECT_THAT(refused({"favorites", "add", "M1"}), HasSubstr("Choose one of city:M1, town:M1."));
 }
 
+TEST_F(FavoritesCommandsTest, AMisspeltLineIsAskedFor) {
+    EXPECT_EQ(refused({"favorites", "add", "Skylin Cabel Car"}),
+              "orvo: no line is called Skylin Cabel Car\n"
+              "Did you mean city:SKY (Skyline Cable Car)?\n");
+    EXPECT_THAT(refused({"favorites", "add", "Exprss"}),
+                HasSubstr("\nDid you mean one of city:CE (Coastal Express), city:X90 (Airport "
+                          "Express)?\n"));
+    // There are four of them: the best three.
+    EXPECT_THAT(refused({"favorites", "add", "Centrel"}),
+                HasSubstr("\nDid you mean one of city:T7 (Central Station – Hillside), city:S1 "
+                          "(Central Station – Northern Coast), city:N3 (Night bus Central Station "
+                          "– Old Harbour)?\n"));
+}
+
+TEST_F(FavoritesCommandsTest, APartOfANameIsAskedForWhereFewLinesHaveIt) {
+    EXPECT_THAT(refused({"favorites", "add", "Express"}),
+                HasSubstr("\nDid you mean one of city:CE (Coastal Express), city:X90 (Airport "
+                          "Express)?\n"));
+    EXPECT_THAT(refused({"favorites", "add", "Harbour"}),
+                HasSubstr("\nLook for it with: orvo lines \"Harbour\"\n"));
+}
+
+TEST_F(FavoritesCommandsTest, ALineOfAFeedIsAskedForByNumberInAnyCaseAndByName) {
+    EXPECT_EQ(refused({"favorites", "add", "city:m1"}),
+              "orvo: the schedule of city has no line m1\n"
+              "Did you mean city:M1 (Airport – Old Harbour)?\n");
+    EXPECT_THAT(refused({"favorites", "add", "city:Skylyne"}),
+                HasSubstr("\nDid you mean city:SKY (Skyline Cable Car)?\n"));
+    EXPECT_THAT(refused({"favorites", "add", "city:M9"}),
+                HasSubstr("\nFind its lines with: orvo lines city\n"));
+}
+
+TEST_F(FavoritesCommandsTest, NoOtherNumberIsAskedForAndNothingThatIsFar) {
+    for (const char* name : {"M3", "9", "X91", "B4", "Tramway", "zzzzzz", "?"})
+        EXPECT_THAT(refused({"favorites", "add", name}),
+                    HasSubstr("\nLook for it with: orvo lines"))
+            << name;
+}
+
+TEST_F(FavoritesCommandsTest, ListAndIncidentsNameALineInThePersonsLanguage) {
+    answered({"favorites", "add", "city:SKY"});
+    EXPECT_EQ(answered({"favorites", "list", "--language", "de"}),
+              "1\tcity:SKY\tPanorama-Seilbahn\tHarbour and Hills Railway\n");
+    EXPECT_THAT(answered({"favorites", "list", "--json", "--language", "de"}),
+                HasSubstr("\"name\": \"Panorama-Seilbahn\""));
+    EXPECT_THAT(answered({"incidents", "--language", "de"}), HasSubstr("Panorama-Seilbahn"));
+    EXPECT_EQ(answered({"favorites", "list"}),
+              "1\tcity:SKY\tSkyline Cable Car\tHarbour and Hills Railway\n");
+}
+
+TEST_F(FavoritesCommandsTest, ALineIsMovedAndRemovedByItsShownAndByItsKeptName) {
+    for (const char* name : {"Panorama-Seilbahn", "panorama-seilbahn", "Skyline Cable Car"}) {
+        answered({"favorites", "add", "M1", "city:SKY"});
+        EXPECT_EQ(answered({"favorites", "move", name, "1", "--language", "de"}),
+                  "Panorama-Seilbahn is number 1 now\n");
+        EXPECT_EQ(answered({"favorites", "remove", name, "M1", "--language", "de"}),
+                  "Removed Panorama-Seilbahn\nRemoved M1\n");
+    }
+    answered({"favorites", "add", "city:SKY"});
+    EXPECT_THAT(refused({"favorites", "remove", "Panorama-Seilbahn"}), // English
+                HasSubstr("there is no favourite Panorama-Seilbahn"));
+}
+
+TEST_F(FavoritesCommandsTest, ANameThatOneLineShowsAndAnotherWasKeptByIsOfSeveral) {
+    answered({"favorites", "add", "city:SKY"});
+    answered({"favorites", "add", "--place", "Panorama-Seilbahn", "--location", "1,2"});
+    EXPECT_EQ(refused({"favorites", "remove", "Panorama-Seilbahn", "--language", "de"}),
+              "orvo: several favourites are called Panorama-Seilbahn\nSee: orvo favorites list\n");
+    EXPECT_EQ(answered({"favorites", "remove", "Panorama-Seilbahn"}),
+              "Removed Panorama-Seilbahn\n");
+    EXPECT_THAT(answered({"favorites", "list"}), HasSubstr("city:SKY"));
+}
+
+TEST_F(FavoritesCommandsTest, WithoutSchedulesALineHasTheNameThatItWasKeptBy) {
+    answered({"favorites", "add", "city:SKY"});
+    write("data/schedules.sqlite", "no database at all, though long enough for a header of one");
+    EXPECT_EQ(answered({"favorites", "list", "--language", "de"}),
+              "1\tcity:SKY\tSkyline Cable Car\tHarbour and Hills Railway\n");
+    answered({"favorites", "move", "Skyline Cable Car", "1"});
+    EXPECT_EQ(answered({"favorites", "remove", "Skyline Cable Car"}),
+              "Removed Skyline Cable Car\n");
+}
+
+TEST_F(FavoritesCommandsTest, AMisspeltFavouriteIsAskedFor) {
+    answered({"favorites", "add", "M1", "M2", "city:SKY"});
+    answered({"favorites", "add", "--place", "Kindergarten", "--location", "1,2"});
+    EXPECT_EQ(refused({"favorites", "remove", "Skylin Cabel Car"}),
+              "orvo: there is no favourite Skylin Cabel Car\n"
+              "Did you mean city:SKY (Skyline Cable Car)?\n");
+    EXPECT_THAT(refused({"favorites", "move", "Kindergarden", "1"}),
+                HasSubstr("\nDid you mean Kindergarten?\n"));
+    EXPECT_THAT(refused({"favorites", "remove", "M3"}), HasSubstr("\nSee: orvo favorites list\n"));
+}
+
 TEST_F(FavoritesCommandsTest, AddingAgainSaysSo) {
     answered({"favorites", "add", "M1"});
     EXPECT_THAT(answered({"favorites", "add", "M1"}), HasSubstr("Already a favourite"));

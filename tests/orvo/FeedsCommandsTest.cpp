@@ -278,7 +278,33 @@ TEST_F(FeedsCommandsTest, RemoveForgetsTheScheduleToo) {
     addCity();
     EXPECT_EQ(answered({"feeds", "remove", "city"}), "Removed city\n");
     EXPECT_EQ(answered({"feeds", "list"}), "");
-    EXPECT_THAT(refused({"lines", "M1"}), HasSubstr("there is no schedule yet"));
+    EXPECT_THAT(run({"lines", "M1"}).error, HasSubstr("There is no schedule yet. Add a feed with"));
+}
+
+TEST_F(FeedsCommandsTest, LinesWithoutAnyScheduleAreNoneInBothForms) {
+    const auto text = run({"lines", "M1"});
+    EXPECT_EQ(text.code, ExitCode::Answered);
+    EXPECT_EQ(text.output, "");
+    EXPECT_EQ(text.error,
+              "There is no schedule yet. Add a feed with: orvo feeds add. For those that you have: "
+              "orvo feeds update\n");
+    const auto json = run({"lines", "M1", "--json"});
+    EXPECT_EQ(json.code, ExitCode::Answered);
+    EXPECT_EQ(json.output, "{\n  \"lines\": [],\n  \"total\": 0,\n  \"error\": null\n}\n");
+    EXPECT_EQ(json.error, "");
+    EXPECT_THAT(refused({"favorites", "add", "M1"}), HasSubstr("there is no schedule yet"));
+}
+
+TEST_F(FeedsCommandsTest, AMisspeltSearchNamesTheLinesThatAreNear) {
+    addCity();
+    const auto near = run({"lines", "Skylin", "Cabel", "Car"});
+    EXPECT_EQ(near.code, ExitCode::Answered);
+    EXPECT_EQ(near.output, "");
+    EXPECT_EQ(near.error,
+              "No line matches Skylin Cabel Car. Did you mean city:SKY (Skyline Cable Car)?\n");
+    EXPECT_EQ(run({"lines", "zzzzz"}).error, "No line matches zzzzz.\n");
+    EXPECT_EQ(run({"lines", "M9"}).error, "No line matches M9.\n");
+    EXPECT_EQ(run({"lines", "Skylin Cabel Car", "--json"}).error, "");
 }
 
 TEST_F(FeedsCommandsTest, LinesThatCannotBeReadAreAFailureAndNotNone) {

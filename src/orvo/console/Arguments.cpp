@@ -1,8 +1,10 @@
 #include "orvo/console/Arguments.h"
 
+#include "platform/foundation/EditDistance.h"
+#include "platform/foundation/Text.h"
+
 #include <algorithm>
 #include <fmt/ranges.h>
-#include <numeric>
 #include <utility>
 
 namespace orvo {
@@ -36,24 +38,6 @@ namespace {
 bool looksLikeOption(std::string_view word) {
     return word.size() > 1 && word[0] == '-' && word[1] != '.' &&
            !(word[1] >= '0' && word[1] <= '9');
-}
-
-/// How many letters were left out, added, changed, or swapped with their neighbour.
-std::size_t editDistance(std::string_view a, std::string_view b) {
-    std::vector<std::size_t> beforeLast(b.size() + 1);
-    std::vector<std::size_t> last(b.size() + 1);
-    std::iota(last.begin(), last.end(), std::size_t{0});
-    for (std::size_t i = 1; i <= a.size(); ++i) {
-        std::vector<std::size_t> row(b.size() + 1, i);
-        for (std::size_t j = 1; j <= b.size(); ++j) {
-            const std::size_t changed = last[j - 1] + (a[i - 1] == b[j - 1] ? 0 : 1);
-            row[j] = std::min({changed, last[j] + 1, row[j - 1] + 1});
-            if (i > 1 && j > 1 && a[i - 1] == b[j - 2] && a[i - 2] == b[j - 1])
-                row[j] = std::min(row[j], beforeLast[j - 2] + 1);
-        }
-        beforeLast = std::exchange(last, std::move(row));
-    }
-    return last.back();
 }
 
 /// One pass over the words of a command line.
@@ -231,11 +215,12 @@ ArgumentParser::parse(const std::vector<std::string>& words) const {
 
 std::optional<std::string> nearest(std::string_view word,
                                    const std::vector<std::string>& candidates) {
+    const auto letters = Text::utf16(word);
     std::optional<std::string> best;
-    std::size_t bestDistance = std::max<std::size_t>(1, word.size() / 3) + 1;
+    std::size_t bestDistance = std::max<std::size_t>(1, letters.size() / 3) + 1;
     for (const auto& candidate : candidates) {
         const bool begins = word.size() > 1 && candidate.rfind(word, 0) == 0;
-        const std::size_t distance = begins ? 1 : editDistance(word, candidate);
+        const std::size_t distance = begins ? 1 : editDistance(letters, Text::utf16(candidate));
         if (distance < bestDistance) {
             bestDistance = distance;
             best = candidate;

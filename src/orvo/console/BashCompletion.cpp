@@ -7,6 +7,14 @@ namespace orvo::Completion {
 
 namespace {
 
+std::vector<std::string> namesAfter(const ProgramSpec& program,
+                                    const std::vector<std::string>& group) {
+    std::vector<std::string> names;
+    for (const auto& [name, explanation] : wordsAfter(program, group))
+        names.push_back(name);
+    return names;
+}
+
 std::string bashReply(Completes what, const std::vector<std::string>& words) {
     if (const char* kind = machineWords(what))
         return fmt::format("_orvo_words {}", kind);
@@ -18,8 +26,22 @@ std::string bashReply(Completes what, const std::vector<std::string>& words) {
                        quoted(fmt::format("{}", fmt::join(words, " "))));
 }
 
-std::string bashOperands(const CommandSpec& command) {
+/// What stands in the place of a command's words, by those before it.
+std::string bashGroups(const ProgramSpec& program, const char* indent) {
     std::string text;
+    for (const auto& group : groupsOf(program))
+        text += fmt::format("{}{}) {} ;;\n",
+                            indent,
+                            quoted(fmt::format("{}", fmt::join(group, " "))),
+                            bashReply(Completes::Word, namesAfter(program, group)));
+    return text;
+}
+
+std::string bashOperands(const ProgramSpec& program, const CommandSpec& command) {
+    if (asksForCommands(command))
+        return "        *) case \"${operands[*]}\" in\n" + bashGroups(program, "            ") +
+               "            esac ;;\n";
+    std::string text = "        *) case ${#operands[@]} in\n";
     for (std::size_t i = 0; i < command.operands.size(); ++i) {
         const auto& operand = command.operands[i];
         const bool repeats = operand.count == OperandSpec::Count::OneOrMore ||
@@ -28,7 +50,7 @@ std::string bashOperands(const CommandSpec& command) {
                             repeats ? "*" : fmt::format("{}", i),
                             bashReply(operand.completes, operand.words));
     }
-    return text;
+    return text + "            esac ;;\n";
 }
 
 /// Asks for names: the words come from schedules of strangers, and are never expanded.
@@ -52,7 +74,7 @@ _orvo_words() {
 constexpr const char* BashBeginning = R"sh(() {
     local line=${COMP_LINE:0:COMP_POINT} previous=$3 place= word skip= demo=
     local current=${line##* }
-    local -i operands=0
+    local -a operands=()
     COMPREPLY=()
     for word in "${COMP_WORDS[@]:1:COMP_CWORD-1}"; do
         [[ $skip ]] && { skip=; continue; }
@@ -74,7 +96,7 @@ std::string optionsWithValues(const ProgramSpec& program) {
     return fmt::format("{}", fmt::join(names, " | "));
 }
 
-std::string bashCommand(const CommandSpec& command) {
+std::string bashCommand(const ProgramSpec& program, const CommandSpec& command) {
     std::string text = fmt::format("    {})\n        case $previous in\n", quoted(command.name()));
     std::vector<std::string> names;
     for (const auto& option : optionsOf(command)) {
@@ -87,7 +109,7 @@ std::string bashCommand(const CommandSpec& command) {
     text += "        esac\n        case $current in\n";
     text += fmt::format("        -*) {} ;;\n", bashReply(Completes::Word, names));
     if (!command.operands.empty())
-        text += "        *) case $operands in\n" + bashOperands(command) + "            esac ;;\n";
+        text += bashOperands(program, command);
     return text + "        esac ;;\n";
 }
 
@@ -103,24 +125,18 @@ std::string bash(const ProgramSpec& program) {
     text += fmt::format("        {}) skip=1; continue ;;\n        -*) continue ;;\n        esac\n",
                         optionsWithValues(program));
     const auto groups = groupsOf(program);
-    const auto namesAfter = [&](const std::vector<std::string>& group) {
-        std::vector<std::string> names;
-        for (const auto& [name, explanation] : wordsAfter(program, group))
-            names.push_back(name);
-        return names;
-    };
     if (!groups.empty())
         text += "        case $place in\n";
     for (const auto& group : groups)
         text += fmt::format("        {}) case $word in {}) place=\"${{place:+$place }}$word\"; "
                             "continue ;; esac ;;\n",
                             quoted(fmt::format("{}", fmt::join(group, " "))),
-                            fmt::join(namesAfter(group), "|"));
+                            fmt::join(namesAfter(program, group), "|"));
     if (!groups.empty())
         text += "        esac\n";
-    text += "        operands+=1\n    done\n    case $place in\n";
+    text += "        operands+=(\"$word\")\n    done\n    case $place in\n";
     for (const auto& group : groups) {
-        auto names = namesAfter(group);
+        auto names = namesAfter(program, group);
         if (group.empty())
             names.insert(names.end(), {"--help", "--version"});
         text += fmt::format("    {}) {} ;;\n",
@@ -128,7 +144,7 @@ std::string bash(const ProgramSpec& program) {
                             bashReply(Completes::Word, names));
     }
     for (const auto& command : program.commands)
-        text += bashCommand(command);
+        text += bashCommand(program, command);
     return text + fmt::format("    esac\n}}\n\ncomplete -F _{} {}\n", function, program.name);
 }
 

@@ -5,8 +5,17 @@
 
 namespace orvo {
 
-/// What a shell offers where a value stands.
-enum class Completes { Nothing, File, Feed, Line, Favorite, Word };
+/// What a shell offers where a value stands. Only a `Word` must be one of those that are offered.
+enum class Completes {
+    Nothing,
+    File,
+    Feed,
+    Line,
+    Favorite,
+    Command, ///< of an operand: the words of the program's commands, one after the other
+    Word,
+    Suggestion,
+};
 
 /// `--name VALUE` or the switch `--name`.
 struct OptionSpec {

@@ -15,7 +15,9 @@ const char* machineWords(Completes what) {
         return "favorites";
     case Completes::Nothing:
     case Completes::File:
+    case Completes::Command:
     case Completes::Word:
+    case Completes::Suggestion:
         break;
     }
     return nullptr;
@@ -48,6 +50,10 @@ std::set<std::vector<std::string>> groupsOf(const ProgramSpec& program) {
         }
     }
     return groups;
+}
+
+bool asksForCommands(const CommandSpec& command) {
+    return std::ranges::count(command.operands, Completes::Command, &OperandSpec::completes) > 0;
 }
 
 bool asksForNames(const ProgramSpec& program) {

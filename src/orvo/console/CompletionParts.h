@@ -21,6 +21,8 @@ wordsAfter(const ProgramSpec& program, const std::vector<std::string>& path);
 /// Paths below which there are commands, the program's own (empty) one first. None for a program
 /// that is one command.
 [[nodiscard]] std::set<std::vector<std::string>> groupsOf(const ProgramSpec& program);
+/// Whether an operand is the words of a command.
+[[nodiscard]] bool asksForCommands(const CommandSpec& command);
 /// Whether some word is a name that only this machine has.
 [[nodiscard]] bool asksForNames(const ProgramSpec& program);
 /// What to type for the script: `orvo completion bash`; a program that is one command has an

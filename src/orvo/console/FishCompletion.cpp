@@ -47,6 +47,22 @@ std::string blankBefore(const std::string& words) {
     return words.empty() ? "" : " " + words;
 }
 
+/// What may follow the words of each group of commands, where those stand after `before`.
+std::string fishCommands(const ProgramSpec& program, const std::string& before) {
+    std::string text;
+    for (const auto& group : groupsOf(program)) {
+        for (const auto& [word, explanation] : wordsAfter(program, group))
+            text += fmt::format("complete -c {} -n '__{}_after 0{}{}' -a {} -d {}\n",
+                                program.name,
+                                functionName(program),
+                                before,
+                                blankBefore(fmt::format("{}", fmt::join(group, " "))),
+                                word,
+                                quoted(explanation));
+    }
+    return text;
+}
+
 std::string fishCommand(const ProgramSpec& program, const CommandSpec& command) {
     const std::string complete = fmt::format("complete -c {}", program.name);
     const std::string function = functionName(program);
@@ -76,6 +92,8 @@ std::string fishCommand(const ProgramSpec& program, const CommandSpec& command) 
                             place,
                             fishCandidates(operand.completes, operand.words));
     }
+    if (asksForCommands(command))
+        text += fishCommands(program, place);
     return text;
 }
 
@@ -96,20 +114,11 @@ std::string fish(const ProgramSpec& program) {
     if (asksForNames(program))
         text += FishNamesFunction;
     text += fmt::format("\ncomplete -c {} -f\n", program.name);
-    const auto groups = groupsOf(program);
-    if (!groups.empty())
+    if (!groupsOf(program).empty())
         text += fmt::format("complete -c {} -n '__{}_after 0' -l version -d 'show the version'\n",
                             program.name,
                             function);
-    for (const auto& group : groups) {
-        for (const auto& [word, explanation] : wordsAfter(program, group))
-            text += fmt::format("complete -c {} -n '__{}_after 0{}' -a {} -d {}\n",
-                                program.name,
-                                function,
-                                blankBefore(fmt::format("{}", fmt::join(group, " "))),
-                                word,
-                                quoted(explanation));
-    }
+    text += fishCommands(program, "");
     for (const auto& command : program.commands)
         text += fishCommand(program, command);
     return text;

@@ -1,5 +1,6 @@
 #include "orvo/console/CompletionParts.h"
 
+#include <algorithm>
 #include <fmt/format.h>
 #include <fmt/ranges.h>
 
@@ -10,6 +11,8 @@ namespace {
 std::string zshAction(Completes what, const std::vector<std::string>& words) {
     if (const char* kind = machineWords(what))
         return fmt::format("->{}", kind);
+    if (what == Completes::Command)
+        return "->commands";
     if (what == Completes::File)
         return "_files";
     return words.empty() ? " " : fmt::format("({})", fmt::join(words, " "));
@@ -47,6 +50,20 @@ std::string zshCommand(const CommandSpec& command) {
     return text + " ;;\n";
 }
 
+/// Offers what may follow the words of a group of commands.
+std::string zshCommandsFunction(const ProgramSpec& program) {
+    std::string text = fmt::format("_{}_commands() {{\n    local -a names\n    case $1 in\n",
+                                   functionName(program));
+    for (const auto& group : groupsOf(program)) {
+        text += fmt::format("    {})\n        names=(",
+                            quoted(fmt::format("{}", fmt::join(group, " "))));
+        for (const auto& [word, explanation] : wordsAfter(program, group))
+            text += fmt::format("\n            {}", quoted(zshText(word) + ":" + explanation));
+        text += "\n        ) ;;\n";
+    }
+    return text + "    *) return 1 ;;\n    esac\n    _describe command names\n}\n\n";
+}
+
 /// How many words say the command, and what may follow where they do not yet.
 std::string zshCommandChoice(const ProgramSpec& program) {
     const auto groups = groupsOf(program);
@@ -63,14 +80,14 @@ std::string zshCommandChoice(const ProgramSpec& program) {
                                 quoted(fmt::format("{}/{}", before, word)),
                                 quoted(before.empty() ? word : fmt::format("{} {}", before, word)));
     }
-    text += "        esac\n    done\n    case $place in\n";
+    text += "        esac\n    done\n    case $place in\n    ";
+    const char* bar = "";
     for (const auto& group : groups) {
-        text += fmt::format("    {})\n        names=(",
-                            quoted(fmt::format("{}", fmt::join(group, " "))));
-        for (const auto& [word, explanation] : wordsAfter(program, group))
-            text += fmt::format("\n            {}", quoted(zshText(word) + ":" + explanation));
-        text += "\n        )\n        _describe command names\n        return ;;\n";
+        text += bar + quoted(fmt::format("{}", fmt::join(group, " ")));
+        bar = " | ";
     }
+    text += fmt::format(")\n        _{}_commands \"$place\"\n        return ;;\n",
+                        functionName(program));
     return text + "    esac\n    shift $taken words\n    ((CURRENT -= taken))\n";
 }
 
@@ -78,10 +95,12 @@ std::string zshCommandChoice(const ProgramSpec& program) {
 
 std::string zsh(const ProgramSpec& program) {
     const bool asks = asksForNames(program);
-    std::string text =
-        fmt::format("#compdef {0}\n# zsh completion for {0}, written by `{1}`\n\n_{0}() {{\n",
-                    program.name,
-                    origin(program, "zsh"));
+    std::string text = fmt::format("#compdef {0}\n# zsh completion for {0}, written by `{1}`\n\n",
+                                   program.name,
+                                   origin(program, "zsh"));
+    if (!groupsOf(program).empty())
+        text += zshCommandsFunction(program);
+    text += fmt::format("_{}() {{\n", program.name);
     text += "    local -a state line names\n    local place= word context\n";
     if (asks)
         text += "    local -a demo=(${(M)words[2,CURRENT-1]:#--demo})\n";
@@ -89,6 +108,13 @@ std::string zsh(const ProgramSpec& program) {
     for (const auto& command : program.commands)
         text += zshCommand(command);
     text += "    esac\n";
+    if (std::ranges::any_of(program.commands, asksForCommands))
+        text += fmt::format(R"sh(    if [[ $state == commands ]]; then
+        _{}_commands "${{(j: :)${{(@)words[2,CURRENT-1]:#-*}}}}"
+        return
+    fi
+)sh",
+                            functionName(program));
     if (asks)
         text += R"sh(    if [[ -n $state ]]; then
         names=(${(f)"$(orvo completion words $state $demo[1] 2>/dev/null)"})

@@ -63,6 +63,8 @@ class Usage(ProgramTest):
         self.assertIn("orvo favorites add", answer.err)
         self.assertIn("orvo favorites add", self.orvo("favorites", "list").err)
         self.assertIn("orvo feeds add", self.orvo("feeds", "list").err)
+        self.assertIn("orvo feeds add", self.orvo("lines", "harbour").err)
+        self.assertEqual(self.orvo("lines", "harbour", "--json").json, {"lines": [], "total": 0, "error": None})
 
     def test_asking_makes_no_favourites_file(self):
         self.orvo("incidents")
@@ -130,8 +132,26 @@ class Completions(Completing, ProgramTest):
         self.assertEqual(self.offered(shell, "orvo feeds re"), ["remove"])
         self.assertIn("--json", self.offered(shell, "orvo incidents --"))
         self.assertEqual(self.offered(shell, "orvo settings step-free o"), ["off", "on"])
+        for command in ("read", "write", "delete"):
+            self.assertEqual(self.offered(shell, f"orvo defaults {command} Orvo"), self.KEYS)
         self.hostile_city()
         self.assertEqual(self.offered(shell, "orvo feeds check "), ["h"])
+
+    KEYS = [f"Orvo.TransitWidget.internal.{key}" for key in ("injectFakeIncidents", "randomNumberIncidents")]
+
+    def test_help_takes_the_words_of_any_command(self):
+        for shell in ("bash", "zsh", "fish"):
+            with self.subTest(shell):
+                commands = self.offered(shell, "orvo help ")
+                self.assertIn("feeds", commands)
+                self.assertIn("incidents", commands)
+                self.assertEqual(self.offered(shell, "orvo help fe"), ["feeds"])
+                self.assertEqual(self.offered(shell, "orvo help feeds "), ["add", "check", "list", "remove", "update"])
+                self.assertEqual(self.offered(shell, "orvo help feeds --demo re"), ["remove"])
+                self.assertEqual(self.offered(shell, "orvo help lines "), [])
+                self.assertEqual(self.offered(shell, "orvo help feeds add "), [])
+                self.assertIn("--demo", self.offered(shell, "orvo help --"))
+                self.assertEqual(self.offered(shell, "orvo defaults "), ["delete", "read", "write"])
 
     def test_fish_offers_commands_options_and_this_machines_names(self):
         self.offers_commands_options_and_this_machines_names("fish")

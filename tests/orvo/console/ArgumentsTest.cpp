@@ -120,6 +120,18 @@ TEST(ArgumentParser, AcceptsOnlyThePermittedWords) {
     EXPECT_EQ(refused({"city", "--mode", "maybe"}).cure, "Choose one of on, off.");
 }
 
+TEST(ArgumentParser, ASuggestionLeavesOtherWordsPermitted) {
+    const CommandSpec command{.path = {"x"},
+                              .summary = "",
+                              .description = "",
+                              .operands = {{.name = "KEY",
+                                            .help = "",
+                                            .completes = Completes::Suggestion,
+                                            .words = {"one", "two"}}}};
+    EXPECT_TRUE(std::holds_alternative<Arguments>(ArgumentParser(command).parse({"three"})));
+    EXPECT_EQ(command.usage(), "x KEY");
+}
+
 TEST(ArgumentParser, HelpNeedsNoOperands) {
     EXPECT_TRUE(parsed({"--help"}).has("help"));
     EXPECT_TRUE(parsed({"-h"}).has("help"));
@@ -158,6 +170,7 @@ TEST(Nearest, FindsASlipOfTheFingerAndNothingElse) {
     EXPECT_EQ(nearest("fav", words), "favorites");
     EXPECT_EQ(nearest("weather", words), std::nullopt);
     EXPECT_EQ(nearest("", words), std::nullopt);
+    EXPECT_EQ(nearest("größe", {"grüße"}), "grüße"); // one letter, of two bytes
 }
 
 } // namespace

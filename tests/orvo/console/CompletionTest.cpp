@@ -8,6 +8,7 @@
 namespace orvo {
 namespace {
 
+using ::testing::AllOf;
 using ::testing::HasSubstr;
 using ::testing::IsEmpty;
 using ::testing::Not;
@@ -50,6 +51,59 @@ TEST(Completion, EveryShellAsksTheProgramForThisMachinesNames) {
     EXPECT_THAT(Completion::script(sampleProgram(), "fish"),
                 HasSubstr("'__orvo_from 0 feeds check' -f -a '(__orvo_words feeds)'"));
     EXPECT_THAT(Completion::script(sampleProgram(), "zsh"), HasSubstr("'*:NAME:->feeds'"));
+}
+
+/// One whose help takes the words of the others.
+ProgramSpec helpfulProgram() {
+    auto program = sampleProgram();
+    program.commands.push_back({.path = {"help"},
+                                .summary = "Explains",
+                                .description = "",
+                                .operands = {{.name = "COMMAND",
+                                              .help = "",
+                                              .count = OperandSpec::Count::Any,
+                                              .completes = Completes::Command}}});
+    return program;
+}
+
+TEST(Completion, TheWordsOfACommandAreOfferedOneAfterTheOther) {
+    EXPECT_THAT(
+        Completion::script(helpfulProgram(), "bash"),
+        HasSubstr(
+            "        *) case \"${operands[*]}\" in\n"
+            "            '') COMPREPLY=($(compgen -W 'feeds lines help' -- \"$current\")) ;;\n"
+            "            'feeds') COMPREPLY=($(compgen -W 'check list' -- \"$current\")) ;;\n"
+            "            esac ;;\n"));
+    EXPECT_THAT(Completion::script(helpfulProgram(), "fish"),
+                AllOf(HasSubstr("-n '__orvo_after 0 help' -a lines -d 'Finds'\n"),
+                      HasSubstr("-n '__orvo_after 0 help feeds' -a list -d 'Lists'\n")));
+    EXPECT_THAT(Completion::script(helpfulProgram(), "zsh"),
+                AllOf(HasSubstr("'*:COMMAND:->commands'"), HasSubstr("$state == commands")));
+}
+
+TEST(Completion, NobodyAsksForCommandsWhereNoWordIsOne) {
+    for (const auto& shell : Completion::shells())
+        EXPECT_THAT(Completion::script(sampleProgram(), shell),
+                    AllOf(Not(HasSubstr("operands[*]")),
+                          Not(HasSubstr("== commands")),
+                          Not(HasSubstr("after 0 lines"))))
+            << shell;
+}
+
+TEST(Completion, SuggestionsAreOfferedAsWordsAre) {
+    const ProgramSpec program{"p",
+                              "",
+                              {{.path = {"set"},
+                                .summary = "",
+                                .description = "",
+                                .operands = {{.name = "KEY",
+                                              .help = "",
+                                              .completes = Completes::Suggestion,
+                                              .words = {"a.b", "a.c"}}}}}};
+    EXPECT_THAT(Completion::script(program, "bash"),
+                HasSubstr("0) COMPREPLY=($(compgen -W 'a.b a.c' -- \"$current\")) ;;"));
+    EXPECT_THAT(Completion::script(program, "zsh"), HasSubstr("':KEY:(a.b a.c)'"));
+    EXPECT_THAT(Completion::script(program, "fish"), HasSubstr("set' -f -a 'a.b a.c'\n"));
 }
 
 TEST(Completion, BracketsAndColonsOfTheHelpAreNoSyntaxForZsh) {

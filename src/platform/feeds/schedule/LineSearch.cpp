@@ -1,5 +1,6 @@
 #include "platform/feeds/schedule/LineSearch.h"
 
+#include "platform/foundation/EditDistance.h"
 #include "platform/foundation/SeededStringHash.h"
 
 #include <unicode/coleitr.h>
@@ -7,6 +8,7 @@
 #include <unicode/uchar.h>
 
 #include <algorithm>
+#include <iterator>
 #include <optional>
 #include <tuple>
 #include <utility>
@@ -37,6 +39,21 @@ bool beginsWith(const Words& words, const Words& wanted) {
            words[wanted.size() - 1].starts_with(wanted.back());
 }
 
+constexpr std::size_t LettersForOneSlip = 4;
+constexpr std::size_t MostSlips = 3;
+constexpr std::size_t LongestMisspelt = 40; // longer ones would take long to compare
+constexpr std::size_t MostWordsMisspelt = 8;
+
+/// How many letters are wrong, where that is few enough for `wanted` to mean `word`.
+std::optional<std::size_t> slipsBetween(const Word& wanted, const Word& word) {
+    const auto [shorter, longer] = std::minmax({wanted.size(), word.size()});
+    const std::size_t most = std::min(shorter / LettersForOneSlip, MostSlips);
+    if (longer - shorter > most || most == 0 || longer > LongestMisspelt)
+        return std::nullopt;
+    const std::size_t slips = editDistance(wanted, word);
+    return slips <= most ? std::optional(slips) : std::nullopt;
+}
+
 template <class Predicate>
 bool allOf(const Words& wanted, Predicate predicate) {
     return std::ranges::all_of(wanted, predicate);
@@ -58,6 +75,7 @@ struct LineSearch::Comparer {
     std::unique_ptr<icu::RuleBasedCollator> collator;
     std::unique_ptr<icu::CollationElementIterator> elements;
     SeededTextMap<std::string, Words> agencies; // few names, on many lines
+    Word digits;                                // those of all scripts weigh the same
 
     explicit Comparer(const std::string& locale) {
         UErrorCode status = U_ZERO_ERROR;
@@ -69,9 +87,10 @@ struct LineSearch::Comparer {
         collator.reset(static_cast<icu::RuleBasedCollator*>(made.release()));
         collator->setStrength(icu::Collator::PRIMARY);
         elements.reset(collator->createCollationElementIterator(icu::UnicodeString()));
+        digits = wordsOf("0123456789").at(0);
     }
 
-    Words wordsOf(std::string_view text) {
+    Words wordsOf(std::string_view text) const {
         const auto source = icu::UnicodeString::fromUTF8(
             icu::StringPiece(text.data(), static_cast<int32_t>(text.size())));
         Words words;
@@ -110,7 +129,44 @@ struct LineSearch::Comparer {
         return {rank, beginsWith(shortName, wanted) ? shortName.size() : longName.size()};
     }
 
+    /// How many letters of `wanted` are wrong for this line, and how many words its names have;
+    /// nothing where it was not meant.
+    std::optional<std::pair<std::size_t, std::size_t>> slips(const ScheduleLine& line,
+                                                             const Words& wanted) {
+        Words names = wordsOf(line.longName);
+        std::ranges::move(wordsOf(line.shortName), std::back_inserter(names));
+        const Words& agency = agencyWords(line.agency.name);
+        std::size_t total = 0;
+        for (const Word& word : wanted) {
+            if (isIn(names, word) || isIn(agency, word))
+                continue;
+            const auto fewest = hasDigit(word) ? std::nullopt : fewestSlips(word, names);
+            if (!fewest)
+                return std::nullopt;
+            total += *fewest;
+        }
+        return std::pair(total, names.size());
+    }
+
 private:
+    bool hasDigit(const Word& word) const { return word.find_first_of(digits) != Word::npos; }
+
+    /// A word may be left unfinished, a number not.
+    bool isIn(const Words& words, const Word& wanted) const {
+        return hasDigit(wanted) ? std::ranges::count(words, wanted) > 0
+                                : anyBeginsWith(words, wanted);
+    }
+
+    std::optional<std::size_t> fewestSlips(const Word& wanted, const Words& names) const {
+        std::optional<std::size_t> fewest;
+        for (const Word& name : names) {
+            const auto slips = hasDigit(name) ? std::nullopt : slipsBetween(wanted, name);
+            if (slips && (!fewest || *slips < *fewest))
+                fewest = slips;
+        }
+        return fewest;
+    }
+
     Rank rankOf(const ScheduleLine& line,
                 const Words& shortName,
                 const Words& longName,
@@ -137,7 +193,7 @@ private:
         return NoMatch;
     }
 
-    void addWord(Words& words, const icu::UnicodeString& text) {
+    void addWord(Words& words, const icu::UnicodeString& text) const {
         if (text.isEmpty() || !elements)
             return;
         UErrorCode status = U_ZERO_ERROR;
@@ -188,6 +244,24 @@ std::vector<ScheduleLine> LineSearch::named(std::vector<ScheduleLine> lines,
         return !isNamed(line.shortName) && !isNamed(line.longName);
     });
     return lines;
+}
+
+std::vector<ScheduleLine>
+LineSearch::near(std::vector<ScheduleLine> lines, std::string_view text, std::size_t limit) {
+    const Words wanted = _comparer->wordsOf(text);
+    if (wanted.empty() || wanted.size() > MostWordsMisspelt)
+        return {};
+    std::vector<std::tuple<std::size_t, std::size_t, std::size_t>> found;
+    for (std::size_t index = 0; index < lines.size(); ++index)
+        if (const auto slips = _comparer->slips(lines[index], wanted))
+            found.emplace_back(slips->first, slips->second, index);
+    std::ranges::sort(found);
+    found.resize(std::min(found.size(), limit));
+    std::vector<ScheduleLine> near;
+    near.reserve(found.size());
+    for (const auto& [slips, words, index] : found)
+        near.push_back(std::move(lines[index]));
+    return near;
 }
 
 } // namespace orvo

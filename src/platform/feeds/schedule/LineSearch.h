@@ -32,6 +32,16 @@ public:
     [[nodiscard]] std::vector<ScheduleLine> named(std::vector<ScheduleLine> lines,
                                                   std::string_view name);
 
+    /// At most `limit` lines that were probably meant by a `text` that finds none: each of its
+    /// words begins one of the names or the agency's, or is one of the names' misspelt. The nearest
+    /// come first, then those whose names have fewer words; equally good ones keep their order.
+    ///
+    /// Of four letters one may be wrong, of eight two, of twelve and more three: left out, added,
+    /// changed, or swapped with its neighbour. A shorter word is spelt right, and one with a digit
+    /// is whole, too: another number is another line.
+    [[nodiscard]] std::vector<ScheduleLine>
+    near(std::vector<ScheduleLine> lines, std::string_view text, std::size_t limit);
+
 private:
     struct Comparer;
     std::unique_ptr<Comparer> _comparer;

@@ -111,14 +111,15 @@ struct ScheduleStore::Implementation {
         const std::string locale = Text::locale().get();
         LineSearch search(locale); // others need not wait for it
         Lines own;
-        Lines lines = answer<Lines>(
+        auto lines = answer<Lines>(
             [&](ScheduleQueries& reading) {
                 own = reading.allLines();
                 return reading.translated(own, locale);
             },
             error);
+        const bool isTranslated = lines != own;
         lines = find(search, std::move(lines));
-        if (!lines.empty())
+        if (!lines.empty() || !isTranslated)
             return lines;
         own = find(search, std::move(own));
         return answer<Lines>(
@@ -277,6 +278,16 @@ std::vector<ScheduleLine> ScheduleStore::linesNamed(std::string_view name,
     return _implementation->found(
         [&](LineSearch& search, std::vector<ScheduleLine> lines) {
             return search.named(std::move(lines), name);
+        },
+        error);
+}
+
+std::vector<ScheduleLine> ScheduleStore::linesNear(std::string_view text,
+                                                   std::size_t limit,
+                                                   std::shared_ptr<NSError>* error) const {
+    return _implementation->found(
+        [&](LineSearch& search, std::vector<ScheduleLine> lines) {
+            return search.near(std::move(lines), text, limit);
         },
         error);
 }

@@ -68,6 +68,10 @@ public:
     /// `search` compares them.
     [[nodiscard]] std::vector<ScheduleLine>
     linesNamed(std::string_view name, std::shared_ptr<NSError>* error = nullptr) const;
+    /// At most `limit` lines that were probably meant by a misspelt `text`, nearest first, as
+    /// `LineSearch::near` says; for a text by which `search` finds none.
+    [[nodiscard]] std::vector<ScheduleLine> linesNear(
+        std::string_view text, std::size_t limit, std::shared_ptr<NSError>* error = nullptr) const;
 
     /// Reads the schedule whole and then puts it in the place of the feed's earlier one, in one
     /// transaction. A line that is not in the new one stays known with `present` false.

@@ -103,5 +103,71 @@ TEST(LineSearch, NamedIsTheWholeShortOrLongName) {
     EXPECT_THAT(routesOf(search.named(lines, "")), IsEmpty());
 }
 
+std::vector<std::string>
+near(std::vector<ScheduleLine> lines, const std::string& text, std::size_t limit = 100) {
+    return routesOf(LineSearch("en").near(std::move(lines), text, limit));
+}
+
+TEST(LineSearch, NearIsAMisspeltWordOfAName) {
+    const std::vector<ScheduleLine> lines = {line("a", "1", "Airport – Old Harbour"),
+                                             line("b", "2", "Gare - Mairie"),
+                                             line("c", "Harbour", "")};
+    for (const char* text : {"harbor", "HARBUOR", "hárbourr", "arbour", "harbaur"})
+        EXPECT_THAT(near(lines, text), ElementsAre("c", "a")) << text;
+    EXPECT_THAT(near(lines, "old harbor"), ElementsAre("a"));
+    EXPECT_THAT(near(lines, "harbor 1"), ElementsAre("a"));
+    EXPECT_THAT(near(lines, "harbor 2"), IsEmpty());
+}
+
+TEST(LineSearch, NearerLinesComeFirstThenShorterNames) {
+    const std::vector<ScheduleLine> lines = {line("two", "1", "Mountaineer"),
+                                             line("long", "2", "Mountainear to the lake"),
+                                             line("short", "3", "Mountainear"),
+                                             line("also", "4", "Mountainear")};
+    EXPECT_THAT(near(lines, "mountinear"), ElementsAre("short", "also", "long", "two"));
+    EXPECT_THAT(near(lines, "mountinear", 2), ElementsAre("short", "also"));
+}
+
+TEST(LineSearch, NearAllowsMoreSlipsInLongerWords) {
+    const auto isNear = [](const std::string& name, const std::string& text) {
+        return !near({line("a", "", name)}, text).empty();
+    };
+    EXPECT_TRUE(isNear("Quay", "Quai"));
+    EXPECT_FALSE(isNear("Red", "Bed"));
+    EXPECT_FALSE(isNear("East", "West"));
+    EXPECT_FALSE(isNear("Harbour", "Habor"));
+    EXPECT_TRUE(isNear("Waterfront", "Wtarfront"));
+    EXPECT_FALSE(isNear("Waterfront", "Wtarfrnot"));
+    EXPECT_TRUE(isNear("Metropolitan Line", "Matropolitn lina"));
+    EXPECT_FALSE(isNear(std::string(41, 'a'), std::string(40, 'a') + 'b'));
+}
+
+TEST(LineSearch, AnotherNumberIsAnotherLineAndNotNear) {
+    EXPECT_THAT(
+        near({line("a", "2041", ""), line("b", "SX41", ""), line("c", "Night", "")}, "2042"),
+        IsEmpty());
+    EXPECT_THAT(near({line("a", "N4321", "")}, "4321"), IsEmpty());
+    EXPECT_THAT(near({line("a", "43210", "")}, "4321"), IsEmpty());
+    EXPECT_THAT(near({line("a", "12", "Harbour"), line("b", "1", "Harbour")}, "harbor 1"),
+                ElementsAre("b"));
+    EXPECT_THAT(near({line("a", "Tram", "")}, "Tram4"), IsEmpty());
+    EXPECT_THAT(near({line("a", "٢٠٤١", "")}, "٢٠٤٢"), IsEmpty());
+}
+
+TEST(LineSearch, AnAgencyIsSpeltRightOrNotMeant) {
+    const std::vector<ScheduleLine> lines = {line("a", "1", "Harbour", "River Boats"),
+                                             line("b", "2", "Harbour", "City Lines")};
+    EXPECT_THAT(near(lines, "river harbor"), ElementsAre("a"));
+    EXPECT_THAT(near(lines, "rivar"), IsEmpty());
+}
+
+TEST(LineSearch, NothingIsNearToATextWithoutWordsOrWithVeryMany) {
+    const std::vector<ScheduleLine> lines = {line("a", "", "Harbour a b c d e f g h")};
+    for (const char* text : {"", " ", "?!"})
+        EXPECT_THAT(near(lines, text), IsEmpty()) << text;
+    EXPECT_THAT(near(lines, "harbor a b c d e f g"), ElementsAre("a"));
+    EXPECT_THAT(near(lines, "harbor a b c d e f g h"), IsEmpty());
+}
+
 } // namespace
 } // namespace orvo

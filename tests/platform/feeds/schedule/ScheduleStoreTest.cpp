@@ -293,6 +293,8 @@ TEST_F(ScheduleStoreTest, NothingThatCannotBeReadIsTakenForNothingThere) {
     EXPECT_THAT(said(), HasSubstr(path().string() + ": "));
     EXPECT_THAT(store->linesNamed("T2", &error), IsEmpty());
     EXPECT_THAT(said(), HasSubstr(path().string() + ": "));
+    EXPECT_THAT(store->linesNear("hopitl", 5, &error), IsEmpty());
+    EXPECT_THAT(said(), HasSubstr(path().string() + ": "));
 }
 
 TEST_F(ScheduleStoreTest, AFileThatWasCutIsAnErrorAndNotAnEmptyStore) {
@@ -367,6 +369,10 @@ TEST_F(ScheduleStoreTest, AnswersNamesInThePersonsLanguage) {
     ASSERT_THAT(routesOf(bySign), ElementsAre("R1"));
     EXPECT_EQ(bySign[0].longName, "Station - Town hall");
     EXPECT_THAT(routesOf(store->linesNamed("gare mairie")), ElementsAre("R1"));
+    const auto misspelt = store->linesNear("mayrie", 5);
+    ASSERT_THAT(routesOf(misspelt), ElementsAre("R1"));
+    EXPECT_EQ(misspelt[0].longName, "Station - Town hall");
+    EXPECT_THAT(routesOf(store->linesNear("statoin", 5)), ElementsAre("R1"));
     EXPECT_EQ(store->lineIndex("city")->lines()[0].longName, "Gare - Mairie");
     ASSERT_EQ(import(testing::smallSchedule()), "");
     EXPECT_EQ(store->lines("city")[0].longName, "Gare - Mairie");
@@ -382,6 +388,8 @@ TEST_F(ScheduleStoreTest, SearchesAllFeedsBestFirst) {
     EXPECT_EQ(store->search("hopital", 1).size(), 1U);
     EXPECT_EQ(store->linesNamed("t2").size(), 2U);
     EXPECT_THAT(store->linesNamed("t"), IsEmpty());
+    EXPECT_EQ(store->linesNear("hopitl", 5).size(), 2U);
+    EXPECT_EQ(store->linesNear("hopitl", 1).size(), 1U);
 }
 
 TEST_F(ScheduleStoreTest, OtherConnectionsSeeAnImportWhole) {
