@@ -31,11 +31,14 @@ inline bool haveWindowApplication() {
     return qobject_cast<QApplication*>(QCoreApplication::instance()) != nullptr;
 }
 
-/// A profile of its own, a clock that stands still, English texts.
+/// A profile of its own, a clock that stands still, English texts read from left to right.
 class WindowTest : public ::testing::Test {
 protected:
     /// A fixture may have windows among its members: they come after this.
-    WindowTest() { haveWindowApplication(); }
+    WindowTest() {
+        haveWindowApplication();
+        QGuiApplication::setLayoutDirection(Qt::LeftToRight);
+    }
 
     static constexpr double Now = 1750000000; // 2025-06-15T15:06:40Z
 
