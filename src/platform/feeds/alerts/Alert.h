@@ -40,7 +40,8 @@ struct Alert {
     std::vector<AlertSelector> selectors; ///< those that were read
     bool hasUnreadSelectors = false;      ///< whether others were passed over
     /// The fields of the alert among which all its selectors are, the read ones too: mostly nothing
-    /// else. Empty for a reader that passes over none.
+    /// else. Empty for a reader that passes over none, and where they are in two places: then all
+    /// of them were read.
     std::string_view selectorFields;
     std::int32_t cause = 1;    ///< a number of `IncidentCause`
     std::int32_t effect = 8;   ///< a number of `IncidentEffect`

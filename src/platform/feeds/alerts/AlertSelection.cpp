@@ -12,6 +12,7 @@
 
 #include <algorithm>
 #include <bit>
+#include <limits>
 #include <set>
 #include <string>
 #include <utility>
@@ -58,7 +59,8 @@ public:
 
     /// Over selectors that would change nothing.
     const char* skim(const char* from, const char* end) const noexcept {
-        return _shapes.skim(from, end);
+        std::size_t unlimited = std::numeric_limits<std::size_t>::max();
+        return _shapes.skim(from, end, unlimited);
     }
 
     [[nodiscard]] const SelectorShapes& shapes() const noexcept { return _shapes; }

@@ -38,8 +38,8 @@ public:
     void choose();
     [[nodiscard]] bool isChosen(std::size_t entity) const;
 
-    /// Tells selectors that name none of the lines from a look at their first bytes. It gets better
-    /// at it with each entity looked at.
+    /// Tells selectors that name none of the lines from a look at their first bytes, by what was
+    /// learnt of the entities looked at.
     [[nodiscard]] const SelectorShapes& shapes() const noexcept;
 
 private:

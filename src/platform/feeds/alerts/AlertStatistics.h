@@ -44,8 +44,9 @@ enum class AlertCount : std::size_t {
     Count_, ///< how many there are
 };
 
-/// Counters by reason. A query for some lines reads the other alerts only as far as needed, so that
-/// its counters are those of the alerts read; a query for all lines counts everything.
+/// Counters by reason. A query for some lines reads the other alerts, and in those that it reads
+/// the selectors of other lines, only as far as needed: its counters are those of what was read. A
+/// query for all lines counts everything.
 class AlertStatistics {
 public:
     void add(AlertCount reason, std::uint64_t count = 1) noexcept {

@@ -20,10 +20,12 @@ void ConcernedLines::find(const Incident& incident) {
         return !member.alert->hasUnreadSelectors;
     };
     _areAll = std::ranges::all_of(incident.members, isWhole);
-    const auto needsSchedule = [](const IncidentMember& member) {
-        return std::ranges::any_of(member.alert->selectors, isBroad);
+    const auto hasOthers = [](const IncidentMember& member) {
+        const Alert& alert = *member.alert;
+        const bool isScattered = alert.selectorFields.empty() && !alert.selectors.empty();
+        return isScattered || std::ranges::any_of(alert.selectors, isBroad);
     };
-    if (!_areAll && std::ranges::any_of(incident.members, needsSchedule))
+    if (!_areAll && std::ranges::any_of(incident.members, hasOthers))
         return findAll(incident);
     collect(incident);
 }

@@ -30,11 +30,12 @@ public:
         : _resolver(resolver) {}
 
     /// Finds the lines of an incident, in the place of the last one's: those that the selectors
-    /// name that were read. When one of them needs the schedule to know its lines, all are read.
+    /// name that were read. All lines when one of these selectors needs the schedule to know its
+    /// own, or the fields of an alert's selectors are not to be had.
     void find(const Incident& incident);
     /// Finds all lines, by the selectors too that were passed over when the alerts were read.
     void findAll(const Incident& incident);
-    /// Whether no selector was passed over.
+    /// Whether `lines()` are all that the incident names.
     [[nodiscard]] bool areAll() const noexcept { return _areAll; }
 
     /// How many selectors named too many lines to be followed, over all incidents: each may name

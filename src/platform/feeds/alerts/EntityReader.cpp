@@ -150,10 +150,11 @@ AlertReading EntityReader::read(std::string_view entity) {
 void EntityReader::readAlert(std::string_view bytes, AlertReading& reading) {
     WireCursor cursor(bytes);
     for (const char* begin = cursor.position(); cursor.next(); begin = cursor.position()) {
+        const std::size_t selectors = _selectors.size();
         readAlertField(cursor, reading);
         if (!_mayPassOver)
             continue;
-        if (cursor.field() == AlertField::InformedEntity)
+        if (_selectors.size() > selectors) // one that was refused may not come back
             addSelectorFields(begin, cursor.position());
         // Mostly the selectors come behind the periods.
         if (cursor.field() == AlertField::InformedEntity ||
@@ -168,8 +169,9 @@ void EntityReader::readAlert(std::string_view bytes, AlertReading& reading) {
 
 void EntityReader::passOver(WireCursor& cursor, Alert& alert) {
     const char* const begin = cursor.position();
-    cursor.skipWith(
-        [&](const char* from, const char* end) noexcept { return _passedOver->skim(from, end); });
+    cursor.skipWith([&](const char* from, const char* end) noexcept {
+        return _passedOver->skim(from, end, _repeatsLeft);
+    });
     if (cursor.position() == begin)
         return;
     addSelectorFields(begin, cursor.position());

@@ -28,7 +28,9 @@ struct AlertReading {
 class EntityReader {
 public:
     /// @param passedOver selectors that need not be read: those that fit these shapes, and name
-    /// none of their wanted routes. Nil to read all. Both outlive the reader.
+    /// none of their wanted routes. Nil to read all.
+    ///
+    /// Statistics and shapes outlive the reader.
     explicit EntityReader(AlertStatistics& statistics, const SelectorShapes* passedOver = nullptr)
         : _statistics(statistics)
         , _passedOver(passedOver) {}

@@ -126,8 +126,10 @@ private:
         SelectorResolver resolver(*_table, _result.statistics);
         ConcernedLines lines(resolver);
         for (const Incident& incident : incidents) {
-            lines.find(incident);
-            if (!lines.areAll() && context.wording.mayBeOnlyName(incident, _table->longestName()))
+            // Whether a title is only a name can be told when all lines are known.
+            if (_selection && !context.wording.mayBeOnlyName(incident, _table->longestName()))
+                lines.find(incident);
+            else
                 lines.findAll(incident);
             buildIncident(context, incident, lines);
         }

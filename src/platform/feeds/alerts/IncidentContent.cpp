@@ -32,34 +32,19 @@ std::string withPlainBlanks(std::string_view line) {
     return plain;
 }
 
-bool isSameText(std::string_view a, std::string_view b) {
-    if (a == b)
-        return true;
-    std::string roomOfA;
-    std::string roomOfB;
-    return IncidentContent::normalised(a, roomOfA) == IncidentContent::normalised(b, roomOfB);
-}
-
 /// Continues the hashes of some contents by one text of each. There may be fewer contents than
 /// lanes.
 void addTexts(Lanes& hashes,
               std::span<const IncidentContent> contents,
               std::string_view IncidentContent::*text) {
-    std::array<std::string, HashLanes> rooms;
     std::array<std::string_view, HashLanes> texts;
-    for (std::size_t lane = 0; lane < contents.size(); ++lane)
-        texts[lane] = IncidentContent::normalised(contents[lane].*text, rooms[lane]);
+    std::ranges::transform(contents, texts.begin(), text);
     hashes = stableHashes(texts, hashes);
     for (std::uint64_t& hash : hashes)
         hash = stableHash(Separator, hash);
 }
 
 } // namespace
-
-bool IncidentContent::isSameAs(const IncidentContent& other) const {
-    return effect == other.effect && isSameText(header, other.header) &&
-           isSameText(description, other.description);
-}
 
 std::vector<std::uint64_t> IncidentContent::numbersOf(std::span<const IncidentContent> contents,
                                                       std::string_view feed) {

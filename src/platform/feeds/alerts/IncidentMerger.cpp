@@ -114,7 +114,7 @@ void IncidentMerger::mergeSameContent() {
         std::uint64_t muid = numbers[i];
         auto [found, isNew] = firsts.try_emplace(muid, i);
         // Two contents of one hash would hide one another: the later takes the next free number.
-        while (muid == 0 || (!isNew && !contents[found->second].isSameAs(contents[i])))
+        while (muid == 0 || (!isNew && contents[found->second] != contents[i]))
             std::tie(found, isNew) = firsts.try_emplace(++muid, i);
         if (isNew)
             _incidents[i].muid = muid;
@@ -124,11 +124,18 @@ void IncidentMerger::mergeSameContent() {
     std::erase_if(_incidents, [](const Incident& incident) { return incident.muid == 0; });
 }
 
-IncidentContent IncidentMerger::contentOf(const Incident& incident) const {
+IncidentContent IncidentMerger::contentOf(const Incident& incident) {
     const auto [header, description] = _preference.bestPair(incident.header, incident.description);
-    return {header ? header->text : std::string_view(),
-            description ? description->text : std::string_view(),
-            incident.effect};
+    return {normalised(header), normalised(description), incident.effect};
+}
+
+/// Once for each text: to clean one takes as long as it has markup.
+std::string_view IncidentMerger::normalised(const AlertText* text) {
+    if (!text)
+        return {};
+    std::string room;
+    const std::string_view line = IncidentContent::normalised(text->text, room);
+    return room.empty() ? line : _normalised.emplace_back(std::move(room));
 }
 
 } // namespace orvo

@@ -6,6 +6,7 @@
 #include "platform/foundation/SeededStringHash.h"
 
 #include <cstddef>
+#include <deque>
 #include <string>
 #include <string_view>
 #include <vector>
@@ -32,12 +33,14 @@ public:
 private:
     void addIncident(Alert& alert, std::size_t source);
     [[nodiscard]] Incident* translationPartner(const Alert& alert, std::size_t source);
-    [[nodiscard]] IncidentContent contentOf(const Incident& incident) const;
+    [[nodiscard]] IncidentContent contentOf(const Incident& incident);
+    [[nodiscard]] std::string_view normalised(const AlertText* text);
     void mergeSameContent();
 
     std::string _feed;
     LanguagePreference _preference;
     std::vector<Incident> _incidents;
+    std::deque<std::string> _normalised; // texts that are compared otherwise than published
     std::size_t _source = 0;
     /// The places of the first and the last incident of one identifier.
     struct SameId {

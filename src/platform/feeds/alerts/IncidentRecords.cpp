@@ -4,6 +4,8 @@
 #include "platform/feeds/alerts/FeedAffectedEntity.h"
 
 #include <algorithm>
+#include <mutex>
+#include <optional>
 #include <utility>
 
 namespace orvo {
@@ -18,7 +20,7 @@ std::shared_ptr<NSDate> dateOf(const std::optional<std::int64_t>& seconds) {
 
 /// The worst that any of the alerts says.
 IncidentSeverity severityOf(const Incident& incident) {
-    std::int32_t severity = static_cast<std::int32_t>(IncidentSeverity::Unknown);
+    auto severity = static_cast<std::int32_t>(IncidentSeverity::Unknown);
     for (const IncidentMember& member : incident.members)
         severity = std::max(severity, member.alert->severity);
     return static_cast<IncidentSeverity>(severity);
@@ -70,8 +72,8 @@ private:
     std::shared_ptr<std::vector<std::string>> _stops = std::make_shared<std::vector<std::string>>();
 };
 
-/// The selectors of an incident as they came. Few are asked for what they name besides the lines
-/// that were asked about.
+/// The selectors of an incident as they came, until somebody asks for what they name besides the
+/// lines that were asked about: few do. They keep the schedule's lines.
 class UnresolvedEntities final : public AffectedEntitySource {
 public:
     UnresolvedEntities(std::shared_ptr<const LineTable> table, const Incident& incident)
@@ -81,6 +83,12 @@ public:
     }
 
     [[nodiscard]] std::shared_ptr<NSArray> affectedEntities() const override {
+        std::call_once(_once, [this] { resolve(); });
+        return _resolved->affectedEntities();
+    }
+
+private:
+    void resolve() const {
         Alert alert;
         EntityReader::readSelectors(_selectorFields, alert.selectors);
         Incident incident;
@@ -89,12 +97,15 @@ public:
         SelectorResolver resolver(*_table, unused);
         ConcernedLines lines(resolver);
         lines.find(incident);
-        return ConcernedEntities(lines).affectedEntities();
+        _resolved.emplace(lines);
+        _table.reset();
+        _selectorFields = {};
     }
 
-private:
-    std::shared_ptr<const LineTable> _table;
-    std::string _selectorFields;
+    mutable std::once_flag _once;
+    mutable std::shared_ptr<const LineTable> _table;
+    mutable std::string _selectorFields;
+    mutable std::optional<ConcernedEntities> _resolved;
 };
 
 std::shared_ptr<const AffectedEntitySource> entitySourceOf(const RecordContext& context,
@@ -181,21 +192,20 @@ std::shared_ptr<FeedTransitIncident> IncidentRecords::record(const ConcernedLine
                                                              const IncidentPeriod& period) {
     if (auto known = made(line, period))
         return known;
-    const bool isFirst = _made.empty();
+    if (!_made.empty()) {
+        _fields = _made.front().record->fields();
+        _details = _made.front().record->details();
+    }
     const auto effect = static_cast<IncidentEffect>(_incident.effect);
-    TransitIncidentRecord::Fields fields =
-        isFirst ? std::move(_fields) : _made.front().record->fields();
-    fields.startDate = dateOf(period.start);
-    fields.endDate = dateOf(period.end);
-    fields.isBlockingIncident = effect == IncidentEffect::NoService && !line.isPart;
-    FeedTransitIncident::Details details =
-        isFirst ? std::move(_details) : _made.front().record->details();
-    details.isPartOfLine = line.isPart;
-    details.timeZone.reset();
+    _fields.startDate = dateOf(period.start);
+    _fields.endDate = dateOf(period.end);
+    _fields.isBlockingIncident = effect == IncidentEffect::NoService && !line.isPart;
+    _details.isPartOfLine = line.isPart;
+    _details.timeZone.reset();
     if (!timeZoneOf(line).empty())
-        details.timeZone = timeZoneOf(line);
+        _details.timeZone = timeZoneOf(line);
     auto record =
-        FeedTransitIncident::initWithFields_details(std::move(fields), std::move(details));
+        FeedTransitIncident::initWithFields_details(std::move(_fields), std::move(_details));
     _made.push_back({period, record});
     return record;
 }

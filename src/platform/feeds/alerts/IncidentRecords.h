@@ -44,8 +44,9 @@ private:
 
     const RecordContext& _context;
     const Incident& _incident;
-    TransitIncidentRecord::Fields _fields; // given to the first record, which others copy
-    FeedTransitIncident::Details _details; // likewise
+    // Of the record that is made next. They are given to it; another takes the first one's.
+    TransitIncidentRecord::Fields _fields;
+    FeedTransitIncident::Details _details;
 
     /// A record and what it was made for.
     struct Made {

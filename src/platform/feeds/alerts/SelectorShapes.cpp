@@ -96,21 +96,26 @@ std::array<char, SelectorShapes::Longest> SelectorShapes::padded(std::string_vie
     return padded;
 }
 
-const char* SelectorShapes::skim(const char* position, const char* end) const noexcept {
+const char*
+SelectorShapes::skim(const char* position, const char* end, std::size_t& left) const noexcept {
     constexpr unsigned char SelectorKey = WireCursor::bytes(5);
-    while (end - position >= 2 && static_cast<unsigned char>(position[0]) == SelectorKey) {
+    std::size_t mayPass = left; // beside the loop: what it points to might be the bytes themselves
+    while (mayPass > 0 && end - position >= 2 &&
+           static_cast<unsigned char>(position[0]) == SelectorKey) {
         const std::size_t size = static_cast<unsigned char>(position[1]);
         const char* const selector = position + 2;
-        const auto left = static_cast<std::size_t>(end - selector);
-        if (size > Longest || size > left)
+        const auto bytesLeft = static_cast<std::size_t>(end - selector);
+        if (size > Longest || size > bytesLeft)
             break;
-        const bool isPassedOver = left >= Longest
+        const bool isPassedOver = bytesLeft >= Longest
                                       ? isUnwanted(_known[size], selector)
                                       : isUnwanted(_known[size], padded({selector, size}).data());
         if (!isPassedOver)
             break;
         position = selector + size;
+        --mayPass;
     }
+    left = mayPass;
     return position;
 }
 

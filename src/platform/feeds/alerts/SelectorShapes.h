@@ -26,7 +26,9 @@ public:
 
     /// From `position`, where a field of an alert begins, over all selectors whose form is known
     /// and whose route is not wanted, to the first field that is anything else, or to `end`.
-    [[nodiscard]] const char* skim(const char* position, const char* end) const noexcept;
+    /// @param left how many selectors may be passed over; lowered by those that were
+    [[nodiscard]] const char*
+    skim(const char* position, const char* end, std::size_t& left) const noexcept;
 
 private:
     static constexpr std::size_t Words = 4;

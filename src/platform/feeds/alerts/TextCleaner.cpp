@@ -166,8 +166,9 @@ std::string clean(std::string_view text) {
 }
 
 std::string cleanLine(std::string_view text) {
-    text = trimmed(text);
-    return isPlain(text) ? std::string(text) : onOneLine(clean(text));
+    std::string room;
+    const std::string_view line = cleanLine(text, room);
+    return room.empty() ? std::string(line) : room;
 }
 
 std::string_view cleanLine(std::string_view text, std::string& room) {

@@ -22,8 +22,8 @@ inline constexpr std::size_t LongestPublished = std::size_t{1} << 20U;
 
 /// `clean` and then `onOneLine`.
 [[nodiscard]] std::string cleanLine(std::string_view text);
-/// The same without a copy where nothing is to be cleaned: views `text`, or `room`, which is
-/// written then.
+/// The same without a copy where nothing is to be cleaned: views `text` then, and leaves `room` as
+/// it was; else views `room`, which is written.
 [[nodiscard]] std::string_view cleanLine(std::string_view text, std::string& room);
 
 /// A clean text with each run of blanks and line breaks as one blank.

@@ -22,8 +22,8 @@ struct Reading {
     Reading& operator=(const Reading&) = delete;
     ~Reading() = default;
 
-    const Alert& alert() const { return reading.alert.value(); }
-    std::uint64_t count(AlertCount reason) const { return statistics.count(reason); }
+    [[nodiscard]] const Alert& alert() const { return reading.alert.value(); }
+    [[nodiscard]] std::uint64_t count(AlertCount reason) const { return statistics.count(reason); }
 };
 
 AlertMaker with(const Wire& more) {
@@ -378,6 +378,26 @@ TEST(EntityReader, AnAlertGivenInTwoPartsIsReadWhole) {
                        &shapes);
     EXPECT_FALSE(read.alert().hasUnreadSelectors);
     EXPECT_EQ(routesOf(read.alert().selectors), "R7 R8 R6 R5");
+}
+
+TEST(EntityReader, SelectorsOfNoInterestCountForTheLimitAndNoneBehindItIsKept) {
+    SelectorShapes shapes;
+    static_cast<void>(shapes.routeOf(ofAgency("R9").str()));
+    constexpr std::size_t Most = 1'000'000;
+    const std::string one = Wire().bytes(5, ofAgency("R7")).str();
+    std::string selectors;
+    selectors.reserve((Most + 2) * one.size());
+    for (std::size_t i = 0; i < Most + 2; ++i)
+        selectors += one;
+    AlertMaker maker;
+    maker.selectors.clear();
+    maker.more.raw(selectors);
+    maker.header.clear();
+    maker.description.clear();
+    const Reading read(maker.entity(), &shapes);
+    EXPECT_TRUE(read.reading.mayConcernAnyLine);
+    EXPECT_EQ(read.alert().selectorFields.size(), Most * one.size());
+    EXPECT_EQ(read.count(AlertCount::UnreadableSelectors), 2U);
 }
 
 TEST(EntityReader, ExtensionsAreSteppedOver) {

@@ -20,14 +20,14 @@ Wire usual(const std::string& agency, const std::string& route, const std::strin
 
 std::string routeOf(const Wire& selector) {
     SelectorShapes shapes;
-    const std::string bytes = selector.str();
-    return std::string(shapes.routeOf(bytes));
+    return std::string(shapes.routeOf(selector.str()));
 }
 
 /// How many of the selectors are passed over, after those of `seen`.
 std::size_t skimmed(const std::vector<Wire>& selectors,
                     const std::vector<Wire>& seen,
-                    const std::vector<std::string>& wanted = {"R1234"}) {
+                    const std::vector<std::string>& wanted = {"R1234"},
+                    std::size_t mayPass = 100) {
     SelectorShapes shapes;
     for (const std::string& route : wanted)
         shapes.want(route);
@@ -38,11 +38,14 @@ std::size_t skimmed(const std::vector<Wire>& selectors,
     for (const Wire& selector : selectors)
         ends.push_back(alert.bytes(5, selector).str().size());
     const std::vector<char> block(alert.str().begin(), alert.str().end());
-    const char* const stopped = shapes.skim(block.data(), block.data() + block.size());
+    std::size_t left = mayPass;
+    const char* const stopped = shapes.skim(block.data(), block.data() + block.size(), left);
     const auto found =
         std::find(ends.begin(), ends.end(), static_cast<std::size_t>(stopped - block.data()));
     EXPECT_NE(found, ends.end()) << "stopped inside a selector";
-    return static_cast<std::size_t>(found - ends.begin());
+    const auto passed = static_cast<std::size_t>(found - ends.begin());
+    EXPECT_EQ(left, mayPass - passed);
+    return passed;
 }
 
 } // namespace
@@ -121,6 +124,12 @@ TEST(SelectorShapes, TwoFormsOfOneLengthAreKnownAndAThirdTakesThePlaceOfTheOlder
     EXPECT_EQ(skimmed({two, usual("A1", "R123", "S12")}, {one, two}, {"R123"}), 1U);
 }
 
+TEST(SelectorShapes, NoMoreArePassedOverThanMayBe) {
+    const Wire seen = usual("A1", "R9999", "S1");
+    EXPECT_EQ(skimmed({seen, seen, seen}, {seen}, {}, 2), 2U);
+    EXPECT_EQ(skimmed({seen, seen, seen}, {seen}, {}, 0), 0U);
+}
+
 TEST(SelectorShapes, CutAtEveryByteItNeverReadsOn) {
     SelectorShapes shapes;
     static_cast<void>(shapes.routeOf(usual("A1", "R9999", "S1").str()));
@@ -128,7 +137,9 @@ TEST(SelectorShapes, CutAtEveryByteItNeverReadsOn) {
     for (std::size_t length = 0; length < whole.size(); ++length) {
         const std::vector<char> block(whole.begin(),
                                       whole.begin() + static_cast<std::ptrdiff_t>(length));
-        EXPECT_EQ(shapes.skim(block.data(), block.data() + block.size()), block.data()) << length;
+        std::size_t left = 100;
+        EXPECT_EQ(shapes.skim(block.data(), block.data() + block.size(), left), block.data());
+        EXPECT_EQ(left, 100U) << length;
     }
 }
 

@@ -33,14 +33,31 @@ std::string affected(const FeedTransitIncident& incident) {
     return text;
 }
 
+std::string told(const FeedTransitIncident& incident) {
+    const FeedTransitIncident::Details& details = incident.details();
+    std::string text = std::to_string(incident.muid());
+    for (const auto& each : {incident.title(),
+                             incident.summary(),
+                             incident.fullDescription(),
+                             incident.messageForNonRoutable(),
+                             details.spokenTitle,
+                             details.link,
+                             details.timeZone})
+        text += '|' + each.value_or("nil");
+    for (const auto& date : {incident.startDate(),
+                             incident.endDate(),
+                             incident.creationDate(),
+                             incident.lastUpdated()})
+        text += '|' + textOf(date);
+    return text + '|' + nameOf(details.severity) + nameOf(details.effect) + nameOf(details.cause) +
+           (incident.isBlockingIncident() ? "|blocking" : "") +
+           (details.isPartOfLine ? "|part" : "") + affected(incident);
+}
+
 std::string told(const LineIncidents& line) {
     std::string text = line.isUnknown ? "unknown" : "known";
     for (const auto& incident : line.incidents)
-        text += "\n" + std::to_string(incident->muid()) + '|' + incident->title().value_or("nil") +
-                '|' + incident->summary().value_or("nil") + '|' + textOf(incident->startDate()) +
-                '|' + textOf(incident->endDate()) + '|' + textOf(incident->creationDate()) +
-                (incident->isBlockingIncident() ? "|blocking" : "") +
-                (incident->details().isPartOfLine ? "|part" : "") + affected(*incident);
+        text += "\n" + told(*incident);
     return text;
 }
 
@@ -52,13 +69,13 @@ public:
 
     std::size_t below(std::size_t count) { return _random() % count; }
     template <class Value>
-    const Value& of(const std::vector<Value>& values) {
+    Value of(const std::vector<Value>& values) {
         return values[below(values.size())];
     }
 
     /// Mostly the usual form that is recognised without being read.
     Wire selector() {
-        const std::string& line = of(_lines);
+        const std::string line = of(_lines);
         switch (below(20)) {
         case 0:
             return Wire().bytes(1, of<std::string>({"A1", "A2", "A9"}));
@@ -89,22 +106,40 @@ public:
         maker.selectors.clear();
         for (std::size_t count = below(7); count > 0; --count)
             maker.selectors.push_back(selector());
-        if (below(2) == 0)
-            maker.activePeriods = {period(1749990000 + below(20000), 0)};
+        for (std::size_t count = below(3); count > 0; --count)
+            maker.activePeriods.push_back(period(1749980000 + below(40000), 0));
         maker.effect = of<std::uint64_t>({1, 4, 4, 6, 10});
-        maker.header = {{of<std::string>({"Delays", "Closed", "1 Harbour", "<b>Tram</b>", ""}),
-                         of<std::string>({"en", "en", "fr"})}};
-        maker.description = {{of<std::string>({"Fire.", "Works."}), maker.header[0].language}};
+        maker.severity = below(5);
+        maker.cause = below(13);
+        const std::string language = of<std::string>({"en", "en", "fr"});
+        maker.header = {{of<std::string>({"Delays",
+                                          "Delays on many lines of the town",
+                                          "Closed for works until the end of the week",
+                                          "Closed for works until next spring",
+                                          "1 Harbour",
+                                          "<b>Tram</b>",
+                                          ""}),
+                         language}};
+        maker.description = {{of<std::string>({"Fire.", "Works."}), language}};
+        if (below(4) == 0)
+            maker.spokenHeader = {{"Spoken", language}};
         if (below(10) == 0)
             maker.more.bytes(5, selector()).number(14, 3).bytes(5, selector());
         return maker;
     }
 
+    Wire entity() {
+        Wire entity = alert().entity();
+        if (below(12) == 0)
+            entity.bytes(5, Wire().bytes(5, selector()).bytes(5, selector()));
+        return entity;
+    }
+
     std::string feed() {
-        std::vector<AlertMaker> alerts;
-        for (std::size_t count = 1 + below(6); count > 0; --count)
-            alerts.push_back(alert());
-        return message(alerts);
+        std::vector<Wire> entities;
+        for (std::size_t count = 1 + below(8); count > 0; --count)
+            entities.push_back(entity());
+        return message(entities);
     }
 
 private:
@@ -118,10 +153,12 @@ TEST(SomeLines, AreToldWhatTheyAreToldAmongAll) {
     std::size_t incidents = 0;
     for (std::uint32_t seed = 0; seed < 4000; ++seed) {
         Chance chance(seed);
-        const std::vector<AlertSource> sources(1 + chance.below(2), source(chance.feed()));
+        std::vector<AlertSource> sources = {source(chance.feed())};
+        if (chance.below(2) == 0)
+            sources.push_back(source(chance.feed()));
         const Answer all(sources, {std::nullopt, Now, "en", false});
-        const std::string& route = chance.of(Routes);
-        const std::string& other = chance.of(Routes);
+        const std::string route = chance.of(Routes);
+        const std::string other = chance.of(Routes);
         const Answer some(
             sources,
             {std::vector{lineMuid("town", route), lineMuid("town", other)}, Now, "en", false});
@@ -130,6 +167,36 @@ TEST(SomeLines, AreToldWhatTheyAreToldAmongAll) {
         incidents += all.incidents(route).size();
     }
     EXPECT_GT(incidents, 4000U); // they are no empty feeds
+}
+
+TEST(SomeLines, AnAlertGivenInTwoPartsConcernsTheLinesOfBoth) {
+    const auto ofAgency = [](std::string_view line) {
+        return Wire().bytes(1, "A1").bytes(2, line);
+    };
+    AlertMaker one;
+    one.header = {{"Trams turn early because of a demonstration", "en"}};
+    one.selectors = {ofAgency("R9"), ofAgency("R1"), ofAgency("R2")};
+    AlertMaker other = one;
+    other.selectors = {ofAgency("R3")};
+    const std::string bytes = message(
+        std::vector<Wire>{one.entity(), other.entity().bytes(5, Wire().bytes(5, ofAgency("M1")))});
+    const Answer some({source(bytes)}, {std::vector{lineMuid("town", "R1")}, Now, "en", false});
+    EXPECT_EQ(affected(*some.incidents("R1").at(0)),
+              affected(*Answer(bytes).incidents("R1").at(0)));
+}
+
+TEST(SomeLines, AffectedEntitiesAreTheSameHoweverOftenTheyAreAskedFor) {
+    AlertMaker alert;
+    alert.header = {{"Trams turn early because of a demonstration", "en"}};
+    alert.selectors.assign(3, Wire().bytes(1, "A1").bytes(2, "R3").bytes(5, "S1"));
+    alert.selectors.push_back(Wire().bytes(1, "A1").bytes(2, "R1"));
+    const Answer some({source(message({alert}))},
+                      {std::vector{lineMuid("town", "R1")}, Now, "en", false});
+    const auto& incident = *some.incidents("R1").at(0);
+    const std::string expected = " " + std::to_string(lineMuid("town", "R1")) + " " +
+                                 std::to_string(lineMuid("town", "R3")) + "/S1";
+    EXPECT_EQ(affected(incident), expected);
+    EXPECT_EQ(affected(incident), expected);
 }
 
 TEST(SomeLines, ATitleThatOnlyNamesALineThatWasNotAskedAboutIsTheEffect) {
