@@ -3,8 +3,10 @@
 #include "fetching/OWTransitIncidentFetcher.h"
 #include "orvo/IncidentReportPrinter.h"
 #include "orvo/UnknownLines.h"
+#include "platform/feeds/FeedLookup.h"
 #include "platform/feeds/ScheduleUpdater.h"
 #include "platform/feeds/TravelPreferences.h"
+#include "platform/feeds/alerts/AlertReader.h"
 #include "platform/feeds/schedule/LineMaker.h"
 #include "platform/foundation/DispatchQueue.h"
 #include "platform/foundation/Environment.h"
@@ -32,6 +34,26 @@ CommandSpec IncidentsCommand::spec() const {
                          {"orvo incidents --demo", "the demonstration city"}}};
 }
 
+namespace {
+
+/// Of the feeds and their alerts another command tells more.
+ExitCode fail(const NSError& error, CommandContext& context) {
+    if (error.domain() != AlertErrorDomain && error.domain() != FeedLookupErrorDomain)
+        return context.fail(error);
+    return context.fail(error.localizedDescription(),
+                        "See what the sources say with: orvo feeds check");
+}
+
+const char* whyEmpty(bool all, CommandContext& context) {
+    if (!all)
+        return "No favourite lines yet. Add one with: orvo favorites add LINE";
+    return context.registry()->feeds().empty()
+               ? "There are no feeds yet. Add one with: orvo feeds add"
+               : "No feed has a schedule yet. Get them with: orvo feeds update";
+}
+
+} // namespace
+
 ExitCode IncidentsCommand::run(const Arguments& arguments, CommandContext& context) {
     // The thread that asks for the main run loop first is the main thread.
     (void)RunLoop::main();
@@ -44,7 +66,7 @@ ExitCode IncidentsCommand::run(const Arguments& arguments, CommandContext& conte
     if (arguments.has("json"))
         context.terminal().output() << report.json();
     if (report.error)
-        return context.fail(*report.error);
+        return fail(*report.error, context);
     if (const auto error = TravelPreferences::unreadable())
         context.terminal().warning("your settings count as never made: " +
                                    error->localizedDescription());
@@ -59,9 +81,7 @@ ExitCode IncidentsCommand::run(const Arguments& arguments, CommandContext& conte
                    : IncidentReportPrinter::Lines::Each);
     UnknownLines::warn(report, context);
     if (report.lines.empty())
-        context.terminal().note(all ? "There are no feeds yet. Add one with: orvo feeds add"
-                                    : "No favourite lines yet. Add one with: orvo favorites add "
-                                      "LINE");
+        context.terminal().note(whyEmpty(all, context));
     lookForNewerSchedules(context);
     return ExitCode::Answered;
 }

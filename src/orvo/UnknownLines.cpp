@@ -31,6 +31,8 @@ std::string cureFor(const IncidentReport::Line& line,
                     const ScheduleStore* schedules) {
     if (!feed)
         return "Add its feed again with orvo feeds add, or remove it with: orvo favorites remove";
+    if (schedules && !schedules->info(feed->name))
+        return fmt::format("Get its schedule with: orvo feeds update {}", feed->name);
     const auto known = schedules ? schedules->line(line.muid) : std::nullopt;
     if (known && !known->present)
         return fmt::format("Look for the line that took its place with: orvo lines {}", feed->name);

@@ -115,6 +115,18 @@ TEST_F(IncidentsCommandTest, WhenNoFeedCanBeReadItFailsAndJsonSaysWhy) {
     EXPECT_THAT(answer.output, HasSubstr("\"lines\": [],\n  \"error\": {\n    \"domain\": \""));
     EXPECT_THAT(answer.output, HasSubstr("city"));
     EXPECT_THAT(answer.error, HasSubstr("orvo: "));
+    EXPECT_THAT(answer.error, HasSubstr("\nSee what the sources say with: orvo feeds check\n"));
+}
+
+TEST_F(IncidentsCommandTest, WithFeedsButNoScheduleItSaysHowToGetThem) {
+    EXPECT_THAT(run({"incidents", "--all"}).error, HasSubstr("There are no feeds yet."));
+    addCity();
+    answered({"favorites", "add", "city:M1"});
+    std::filesystem::remove(ScheduleStore::defaultPath());
+    EXPECT_THAT(run({"incidents", "--all"}).error,
+                HasSubstr("No feed has a schedule yet. Get them with: orvo feeds update"));
+    EXPECT_THAT(run({"incidents"}).error,
+                HasSubstr("Get its schedule with: orvo feeds update city"));
 }
 
 TEST_F(IncidentsCommandTest, AllListsByFeedAndThenInTheSchedulesOrder) {

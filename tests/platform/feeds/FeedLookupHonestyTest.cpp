@@ -99,6 +99,13 @@ TEST_F(FeedLookupHonesty, AHeaderOfMoreThanADayAgoCountsAsUnknown) {
     EXPECT_THAT(statuses(lookUp({city("1"), coast("A")})), ElementsAre("clear", "unknown"));
 }
 
+TEST_F(FeedLookupHonesty, AnOldHeaderIsUnknownAndNoErrorWhereNoOtherFeedIsAsked) {
+    answerWith("city/alerts", alertMessage(NowTimestamp - 2 * 24 * 3600));
+    const auto answer = lookUp({city("1")});
+    EXPECT_FALSE(answer.error);
+    EXPECT_THAT(statuses(answer), ElementsAre("unknown"));
+}
+
 TEST_F(FeedLookupHonesty, AHeaderWithoutTimeOrOfTheFutureIsOfTheTimeOfItsFetch) {
     addCoast();
     answerWith("city/alerts", alertMessage(0, {{.routes = {"1"}}}));

@@ -62,16 +62,14 @@ const std::vector<AlertSelector>& ConcernedLines::selectorsOf(const Alert& alert
 }
 
 /// A selector without a route may name every line of an agency: said twice by one alert it is taken
-/// once.
+/// once. One with a trip names none, and is no reason to pass over another with the same stop.
 void ConcernedLines::addMentions(const std::vector<AlertSelector>& selectors, std::size_t member) {
     _broad.clear();
     for (const AlertSelector& selector : selectors) {
         const bool isPart = SelectorResolver::namesPart(selector);
-        if (isBroad(selector) &&
-            !_broad
-                 .emplace(
-                     selector.agencyId, selector.stopId, selector.routeType.value_or(-1), isPart)
-                 .second)
+        const bool namesTrip = !selector.tripId.empty() || selector.namesDeparture;
+        if (isBroad(selector) && !namesTrip &&
+            !_broad.emplace(selector.agencyId, selector.stopId, selector.routeType).second)
             continue;
         _named.clear();
         if (!isBroad(selector) || _broadLeft > 0)

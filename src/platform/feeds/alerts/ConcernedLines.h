@@ -3,6 +3,8 @@
 #include "platform/feeds/alerts/Incident.h"
 #include "platform/feeds/alerts/SelectorResolver.h"
 
+#include <cstdint>
+#include <optional>
 #include <set>
 #include <span>
 #include <string_view>
@@ -87,7 +89,7 @@ private:
     SelectorResolver::Places _named;
     std::size_t _broadLeft = MostBroad;
     std::size_t _lostSelectors = 0;
-    std::set<std::tuple<std::string_view, std::string_view, std::int32_t, bool>> _broad;
+    std::set<std::tuple<std::string_view, std::string_view, std::optional<std::int32_t>>> _broad;
 };
 
 } // namespace orvo

@@ -259,8 +259,10 @@ private:
                 source.headerTime = _proofs[i].headerTime;
             _result.statistics.add(source.statistics);
         }
+        // One that is old was read: it says how old it is.
         const auto isRead = [](const SourceProof& proof) {
-            return !proof.error;
+            return !proof.error ||
+                   proof.error->code() == static_cast<std::int64_t>(AlertErrorCode::Stale);
         };
         if (std::any_of(_proofs.begin(), _proofs.end(), isRead))
             return;

@@ -51,7 +51,8 @@ struct FeedIncidents {
     std::vector<LineIncidents> lines;       ///< in the order asked
     std::vector<AlertSourceReport> sources; ///< in the order given
     AlertStatistics statistics;             ///< of all sources and of the rules
-    /// Not nil when no source could be read: names the feed and the cause.
+    /// Not nil when no source could be read: names the feed and the cause. A message that is old by
+    /// its own time was read: it makes lines unknown.
     std::shared_ptr<NSError> error;
 };
 

@@ -105,6 +105,21 @@ TEST(ConcernedLines, WhatNamesAllLinesOfAnAgencyIsTakenOnce) {
     EXPECT_EQ(concerned({std::vector<AlertSelector>(3, agency("A1"))}), "R1#0 R2#0 R3#0 M1#0");
 }
 
+TEST(ConcernedLines, ATripWithoutARouteCostsNoOtherSelectorOfItsStop) {
+    AlertSelector trip = at("", "S1");
+    trip.tripId = "T";
+    AlertSelector departure = at("", "S1");
+    departure.namesDeparture = true;
+    EXPECT_EQ(concerned({{trip, departure, at("", "S1")}}), "R1(S1)#0 M1(S1)#0");
+    EXPECT_EQ(concerned({{at("", "S1"), trip}}), "R1(S1)#0 M1(S1)#0");
+}
+
+TEST(ConcernedLines, ARouteTypeThatIsNoneIsNotNoRouteType) {
+    AlertSelector none = at("", "S1");
+    none.routeType = -1;
+    EXPECT_EQ(concerned({{none, at("", "S1")}}), "R1(S1)#0 M1(S1)#0");
+}
+
 TEST(ConcernedLines, WithoutSelectorsThereAreNone) {
     EXPECT_EQ(concerned({{}}), "");
     EXPECT_EQ(concerned({}), "");

@@ -287,6 +287,8 @@ TEST(IncidentBuilder, AStaleHeaderCountsAsUnknown) {
     const Answer stale({source(message(Alerts{maker()}, At - 90000))}, query());
     EXPECT_EQ(stale.titles("R1"), std::vector<std::string>{"Status unknown"});
     EXPECT_EQ(stale.incidents("R1")[0]->summary(), "Agency A1, last known 1 day ago");
+    EXPECT_FALSE(stale.result().error); // it was read
+    EXPECT_TRUE(stale.result().sources.at(0).error);
 }
 
 TEST(IncidentBuilder, AHeaderWithoutATimeWasMadeWhenItWasFetched) {
