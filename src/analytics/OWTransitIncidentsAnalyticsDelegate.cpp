@@ -50,7 +50,7 @@ void OWTransitIncidentsAnalyticsDelegate::_initWithTransitIncidentsViewControlle
     _transitIncidentsViewController = controller;
 }
 
-bool OWTransitIncidentsAnalyticsDelegate::isExpanded() const {
+bool OWTransitIncidentsAnalyticsDelegate::_isExpanded() const {
     const auto controller = _transitIncidentsViewController.lock();
     const auto context = controller ? controller->extensionContext() : nullptr;
     return context && context->widgetActiveDisplayMode() == NCWidgetDisplayMode::Expanded;
@@ -60,7 +60,7 @@ void OWTransitIncidentsAnalyticsDelegate::startSessionIfNeeded() {
     if (!_sessionStartDate)
         _sessionStartDate = NSDate::date();
     _sessionRecord = std::make_shared<TransitWidgetAnalyticsRecord>();
-    const bool expanded = isExpanded();
+    const bool expanded = _isExpanded();
     _sessionRecord->setInitiallyExpanded(expanded);
     if (expanded)
         _sessionRecord->setEverExpanded(true);
@@ -112,7 +112,7 @@ void OWTransitIncidentsAnalyticsDelegate::recordOpenItemAtIndexPath(
     const std::shared_ptr<NSIndexPath>& indexPath) {
     // In the expanded list the first row counts as 1, like the second; only the compact row is 0.
     const auto row = indexPath ? indexPath->row() : 0;
-    const auto tapped = row == 0 && isExpanded() ? 1 : row;
+    const auto tapped = row == 0 && _isExpanded() ? 1 : row;
     if (_sessionRecord)
         _sessionRecord->setTappedItemIndex(tapped);
     capture(ActionRowOpened);

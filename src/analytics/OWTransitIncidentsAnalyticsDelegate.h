@@ -45,7 +45,7 @@ protected:
     _initWithTransitIncidentsViewController(const std::shared_ptr<UIViewController>& controller);
 
 private:
-    [[nodiscard]] bool isExpanded() const;
+    [[nodiscard]] bool _isExpanded() const;
     void _closeSessionWithEndState(std::int64_t endState);
 
     std::shared_ptr<NSDate> _sessionStartDate;

@@ -12,65 +12,65 @@ DebugTransitLineItem::initWithLine_incidents(std::shared_ptr<TransitLineItem> li
 }
 
 template <class T>
-T DebugTransitLineItem::forward(T (TransitLine::*property)() const) const {
+T DebugTransitLineItem::_forward(T (TransitLine::*property)() const) const {
     const TransitLine* line = _wrappedLine.get();
     return line ? (line->*property)() : T();
 }
 
 std::uint64_t DebugTransitLineItem::muid() const {
-    return forward(&TransitLine::muid);
+    return _forward(&TransitLine::muid);
 }
 
 std::shared_ptr<MapItemIdentifier> DebugTransitLineItem::identifier() const {
-    return forward(&TransitLine::identifier);
+    return _forward(&TransitLine::identifier);
 }
 
 std::optional<std::string> DebugTransitLineItem::name() const {
-    return forward(&TransitLine::name);
+    return _forward(&TransitLine::name);
 }
 
 std::shared_ptr<TransitSystem> DebugTransitLineItem::system() const {
-    return forward(&TransitLine::system);
+    return _forward(&TransitLine::system);
 }
 
 std::uint64_t DebugTransitLineItem::departureTimeDisplayStyle() const {
-    return forward(&TransitLine::departureTimeDisplayStyle);
+    return _forward(&TransitLine::departureTimeDisplayStyle);
 }
 
 bool DebugTransitLineItem::departuresAreVehicleSpecific() const {
-    return forward(&TransitLine::departuresAreVehicleSpecific);
+    return _forward(&TransitLine::departuresAreVehicleSpecific);
 }
 
 bool DebugTransitLineItem::isBus() const {
-    return forward(&TransitLine::isBus);
+    return _forward(&TransitLine::isBus);
 }
 
 std::shared_ptr<TransitArtworkDataSource> DebugTransitLineItem::artwork() const {
-    return forward(&TransitLine::artwork);
+    return _forward(&TransitLine::artwork);
 }
 
 std::shared_ptr<TransitArtworkDataSource> DebugTransitLineItem::modeArtwork() const {
-    return forward(&TransitLine::modeArtwork);
+    return _forward(&TransitLine::modeArtwork);
 }
 
 std::shared_ptr<TransitArtworkDataSource> DebugTransitLineItem::alternateArtwork() const {
-    return forward(&TransitLine::alternateArtwork);
+    return _forward(&TransitLine::alternateArtwork);
 }
 
 bool DebugTransitLineItem::hasLineColorString() const {
-    return forward(&TransitLine::hasLineColorString);
+    return _forward(&TransitLine::hasLineColorString);
 }
 
 std::optional<std::string> DebugTransitLineItem::lineColorString() const {
-    return forward(&TransitLine::lineColorString);
+    return _forward(&TransitLine::lineColorString);
 }
 
 bool DebugTransitLineItem::showVehicleNumber() const {
-    return forward(&TransitLine::showVehicleNumber);
+    return _forward(&TransitLine::showVehicleNumber);
 }
 
 std::shared_ptr<NSArray> DebugTransitLineItem::operatingHours() const {
-    return forward(&TransitLine::operatingHours);
+    return _forward(&TransitLine::operatingHours);
 }
 
 } // namespace orvo

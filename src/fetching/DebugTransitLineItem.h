@@ -46,7 +46,7 @@ public:
 
 private:
     template <class T>
-    [[nodiscard]] T forward(T (TransitLine::*property)() const) const;
+    [[nodiscard]] T _forward(T (TransitLine::*property)() const) const;
 
     std::shared_ptr<NSArray> _incidents; // immutable: to keep it is to copy it
     std::shared_ptr<TransitLineItem> _wrappedLine;

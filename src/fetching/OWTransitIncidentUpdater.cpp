@@ -55,14 +55,14 @@ void OWTransitIncidentUpdater::_initWithTransitLineItems_refreshInterval(
 }
 
 OWTransitIncidentUpdater::~OWTransitIncidentUpdater() {
-    invalidateTimers();
+    _invalidateTimers();
 }
 
 void OWTransitIncidentUpdater::invalidate() {
-    invalidateTimers();
+    _invalidateTimers();
 }
 
-void OWTransitIncidentUpdater::invalidateTimers() {
+void OWTransitIncidentUpdater::_invalidateTimers() {
     if (_refreshTimer)
         _refreshTimer->invalidate();
     if (_nextTimer)

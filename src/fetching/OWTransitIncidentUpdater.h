@@ -75,7 +75,7 @@ protected:
                                                    NSTimeInterval refreshInterval);
 
 private:
-    void invalidateTimers();
+    void _invalidateTimers();
 
     std::shared_ptr<NSOrderedSet> _updateDates = NSOrderedSet::orderedSet();
     std::shared_ptr<NSTimer> _nextTimer;

@@ -94,7 +94,7 @@ bool DynamicTypeWizard::_init() {
     return true;
 }
 
-std::shared_ptr<NSMapTable> DynamicTypeWizard::mapOfPhase(std::uint64_t phase) const {
+std::shared_ptr<NSMapTable> DynamicTypeWizard::_mapOfPhase(std::uint64_t phase) const {
     return std::dynamic_pointer_cast<NSMapTable>(
         _objectToSelectorStringMaps->objectForKey(*NSNumber::numberWithUnsignedInteger(phase)));
 }
@@ -151,13 +151,13 @@ void DynamicTypeWizard::makeObject_performSelector_whenSizeCategoryChangesWithOr
     const std::shared_ptr<NSObject>& object, const Selector& selector, std::uint64_t order) {
     if (!object->respondsToSelector(selector))
         return;
-    if (const auto map = _singletonInstance()->mapOfPhase(order))
+    if (const auto map = _singletonInstance()->_mapOfPhase(order))
         map->setObject_forKey(NSString::string(NSStringFromSelector(selector)), object);
 }
 
 void DynamicTypeWizard::unregisterObject(const std::shared_ptr<NSObject>& object) {
     for (const std::uint64_t phase : {0U, 2U, 1U})
-        _singletonInstance()->mapOfPhase(phase)->removeObjectForKey(object.get());
+        _singletonInstance()->_mapOfPhase(phase)->removeObjectForKey(object.get());
 }
 
 void DynamicTypeWizard::_contentSizeCategoryDidChange() {
@@ -167,15 +167,15 @@ void DynamicTypeWizard::_contentSizeCategoryDidChange() {
         if (box)
             FontControllable::_of(label)->setFont(box->provider()());
     }
-    MakeObjectsPerformSelectorWithMap(mapOfPhase(0));
+    MakeObjectsPerformSelectorWithMap(_mapOfPhase(0));
     for (const auto& constraint : typed<NSLayoutConstraint>(_constraintToValueMap->allKeys()))
         if (const auto value = valueIn(*_constraintToValueMap, constraint))
             ScaleConstraintToDynamicValue(constraint, *value);
     for (const auto& stackView : typed<UIStackView>(_stackToValueMap->allKeys()))
         if (const auto value = valueIn(*_stackToValueMap, stackView))
             applySpacing(*stackView, *value);
-    MakeObjectsPerformSelectorWithMap(mapOfPhase(1));
-    MakeObjectsPerformSelectorWithMap(mapOfPhase(2));
+    MakeObjectsPerformSelectorWithMap(_mapOfPhase(1));
+    MakeObjectsPerformSelectorWithMap(_mapOfPhase(2));
 }
 
 NSObject::Method DynamicTypeWizard::methodForSelector(const Selector& selector) {

@@ -75,7 +75,7 @@ protected:
     bool _init();
 
 private:
-    [[nodiscard]] std::shared_ptr<NSMapTable> mapOfPhase(std::uint64_t phase) const;
+    [[nodiscard]] std::shared_ptr<NSMapTable> _mapOfPhase(std::uint64_t phase) const;
 
     std::shared_ptr<NSMapTable> _labelToFontMap;
     std::shared_ptr<NSMapTable> _constraintToValueMap;

@@ -61,7 +61,7 @@ void OWTransitIncidentDataSource::
     _maxNumberOfRows = maxNumberOfRows;
     _availableWidth = availableWidth;
     _transitLineItemResult = result ? std::move(result) : Result::resultWithValue(NSArray::array());
-    _listItem = builtListItem(nullptr);
+    _listItem = _builtListItem(nullptr);
     _expanded = _sanatizedExpandedValue_forListItem(expanded, _listItem);
     _updateAdjustedShieldItemsAndColumnWidth();
 }
@@ -89,10 +89,10 @@ void OWTransitIncidentDataSource::updateTransitLineItemResult_captureAnalytics(
 
 void OWTransitIncidentDataSource::recalculateDataSourceItemsWithAnalytics(
     const std::shared_ptr<OWTransitIncidentsAnalyticsDelegate>& analytics) {
-    setListItem(builtListItem(analytics));
+    setListItem(_builtListItem(analytics));
 }
 
-std::shared_ptr<OWTransitListItem> OWTransitIncidentDataSource::builtListItem(
+std::shared_ptr<OWTransitListItem> OWTransitIncidentDataSource::_builtListItem(
     const std::shared_ptr<OWTransitIncidentsAnalyticsDelegate>& analytics) const {
     return OWTransitDataSourceBuilderForResult(
                _transitLineItemResult, _maxNumberOfRows, _artworkCache, analytics)
@@ -103,9 +103,9 @@ void OWTransitIncidentDataSource::setListItem(const std::shared_ptr<OWTransitLis
     if (equal(listItem, _listItem))
         return;
     _listItem = listItem;
-    clearAdjustedItems();
+    _clearAdjustedItems();
     _updateAdjustedShieldItemsAndColumnWidth();
-    tellDelegate();
+    _tellDelegate();
 }
 
 void OWTransitIncidentDataSource::setRowHeight_maxNumberOfRows(double rowHeight,
@@ -117,14 +117,14 @@ void OWTransitIncidentDataSource::setRowHeight_maxNumberOfRows(double rowHeight,
     if (isOtherCount)
         recalculateDataSourceItemsWithAnalytics(nullptr);
     else if (isOtherHeight)
-        tellDelegate();
+        _tellDelegate();
 }
 
 void OWTransitIncidentDataSource::setExpanded(bool expanded) {
     if (expanded == _expanded)
         return;
     _expanded = _sanatizedExpandedValue_forListItem(expanded, _listItem);
-    tellDelegate();
+    _tellDelegate();
 }
 
 void OWTransitIncidentDataSource::setAvailableWidth(double width) {
@@ -134,13 +134,13 @@ void OWTransitIncidentDataSource::setAvailableWidth(double width) {
     const auto expandedItems = _shieldAdjustedExpandedItems;
     const auto summaryItem = _shieldAjustedSummaryItem;
     const double columnWidth = _artworkColumnWidth;
-    clearAdjustedItems();
+    _clearAdjustedItems();
     _updateAdjustedShieldItemsAndColumnWidth();
     const bool looksTheSame = columnWidth == _artworkColumnWidth &&
                               (!_expanded || equal(expandedItems, _shieldAdjustedExpandedItems)) &&
                               equal(summaryItem, _shieldAjustedSummaryItem);
     if (!looksTheSame)
-        tellDelegate();
+        _tellDelegate();
 }
 
 CGSize OWTransitIncidentDataSource::preferredContentSizeForExpanded_maxSize(bool /*expanded*/,
@@ -184,28 +184,28 @@ ArtworkWidthCalculatorSizeParameter OWTransitIncidentDataSource::_sizeParameters
 
 void OWTransitIncidentDataSource::_updateAdjustedShieldItemsAndColumnWidth() {
     if (!_shieldAdjustedExpandedItems)
-        _shieldAdjustedExpandedItems = fitted(_listItem->expandedItems());
+        _shieldAdjustedExpandedItems = _fitted(_listItem->expandedItems());
     if (_shieldAjustedSummaryItem)
         return;
     const auto& summaryItem = _listItem->summaryItem();
     _shieldAjustedSummaryItem = std::dynamic_pointer_cast<OWTransitItem>(summaryItem)
-                                    ? fitted(NSArray::arrayOf({summaryItem}))->objectAtIndex(0)
+                                    ? _fitted(NSArray::arrayOf({summaryItem}))->objectAtIndex(0)
                                     : summaryItem;
 }
 
 std::shared_ptr<NSArray>
-OWTransitIncidentDataSource::fitted(const std::shared_ptr<NSArray>& items) {
+OWTransitIncidentDataSource::_fitted(const std::shared_ptr<NSArray>& items) {
     return artworkColumnCalculator()
         ->itemsFromItems_sizeParameter_outArtworkColumnWidth_downSizingBlock(
             items, _sizeParameters(), &_artworkColumnWidth, downSized);
 }
 
-void OWTransitIncidentDataSource::clearAdjustedItems() {
+void OWTransitIncidentDataSource::_clearAdjustedItems() {
     _shieldAdjustedExpandedItems = nullptr;
     _shieldAjustedSummaryItem = nullptr;
 }
 
-void OWTransitIncidentDataSource::tellDelegate() {
+void OWTransitIncidentDataSource::_tellDelegate() {
     if (const auto target = delegate())
         target->dataSourceDidUpdateContent(strong(this));
 }

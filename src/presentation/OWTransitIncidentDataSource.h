@@ -150,10 +150,10 @@ protected:
 
 private:
     [[nodiscard]] std::shared_ptr<OWTransitListItem>
-    builtListItem(const std::shared_ptr<OWTransitIncidentsAnalyticsDelegate>& analytics) const;
-    [[nodiscard]] std::shared_ptr<NSArray> fitted(const std::shared_ptr<NSArray>& items);
-    void clearAdjustedItems();
-    void tellDelegate();
+    _builtListItem(const std::shared_ptr<OWTransitIncidentsAnalyticsDelegate>& analytics) const;
+    [[nodiscard]] std::shared_ptr<NSArray> _fitted(const std::shared_ptr<NSArray>& items);
+    void _clearAdjustedItems();
+    void _tellDelegate();
 
     double _rowHeight = 110;
     std::uint64_t _maxNumberOfRows = 0;

@@ -101,14 +101,14 @@ void Cell::_createSubviews() {
     _contentGuide = UILayoutGuide::init();
     _contentGuide->setIdentifier("contentGuide");
     addLayoutGuide(_contentGuide);
-    createTexts();
+    _createTexts();
     _trailingGutterGuide = UILayoutGuide::init();
     _trailingGutterGuide->setIdentifier("trailingGutterGuide");
     contentView()->addLayoutGuide(_trailingGutterGuide);
-    createArtworkViews();
+    _createArtworkViews();
 }
 
-void Cell::createTexts() {
+void Cell::_createTexts() {
     const auto self = strong(this);
     _stackView = UIStackView::initWithFrame({});
     _stackView->setIdentifier("stackView");
@@ -138,7 +138,7 @@ void Cell::createTexts() {
     _vibrancyViewForSecondaryLabel->setWrappedView(_secondaryLabel);
 }
 
-void Cell::createArtworkViews() {
+void Cell::_createArtworkViews() {
     _nonVibrantImageView = ArtworkImageView::initWithFrame({});
     _nonVibrantImageView->setIdentifier("nonVibrantImageView");
     _nonVibrantImageView->setTranslatesAutoresizingMaskIntoConstraints(false);
@@ -152,13 +152,13 @@ void Cell::createArtworkViews() {
 }
 
 Constraints Cell::_initialConstraints() {
-    auto all = guideConstraints();
-    append(all, textConstraints());
-    append(all, artworkConstraints());
+    auto all = _guideConstraints();
+    append(all, _textConstraints());
+    append(all, _artworkConstraints());
     return all;
 }
 
-Constraints Cell::guideConstraints() {
+Constraints Cell::_guideConstraints() {
     const auto& content = contentView();
     _rowHeightConstraint = content->heightAnchor().constraintEqualToConstant(DefaultRowHeight);
     _rowHeightConstraint->setIdentifier("rowHeight");
@@ -180,7 +180,7 @@ Constraints Cell::guideConstraints() {
     };
 }
 
-Constraints Cell::textConstraints() {
+Constraints Cell::_textConstraints() {
     _primaryLabelToContentGuideConstraint =
         _primaryLabel->firstBaselineAnchor().constraintEqualToAnchor(_contentGuide->topAnchor());
     _primaryLabelToContentGuideConstraint->setIdentifier("primaryLabelToContentGuide");
@@ -205,7 +205,7 @@ Constraints Cell::textConstraints() {
     };
 }
 
-Constraints Cell::artworkConstraints() {
+Constraints Cell::_artworkConstraints() {
     const auto& content = contentView();
     const auto& vibrant = *_vibrantImageView;
     const auto& plain = *_nonVibrantImageView;
@@ -246,7 +246,7 @@ void Cell::setTransitItem(const std::shared_ptr<OWTransitItem>& item) {
     _transitItem = item;
     _primaryLabel->setText(item ? item->primaryText() : std::nullopt);
     _secondaryLabel->setText(item ? item->secondaryText() : std::nullopt);
-    showArtwork();
+    _showArtwork();
     // Only nil hides it: an empty text keeps its line.
     _secondaryLabel->setHidden(!_secondaryLabel->text());
     const bool hidden = item && item->isArtworkHidden();
@@ -256,10 +256,10 @@ void Cell::setTransitItem(const std::shared_ptr<OWTransitItem>& item) {
 
 /// A dimmed artwork takes on the vibrancy of texts instead of shining through by itself. Without an
 /// artwork, as with one of alpha 0.
-void Cell::showArtwork() {
+void Cell::_showArtwork() {
     const auto artwork = _transitItem ? _transitItem->artwork() : nullptr;
     const double alpha = artwork ? artwork->alpha() : 0;
-    auto shown = artworkImageViewInVibrantImageView();
+    auto shown = _artworkImageViewInVibrantImageView();
     auto other = _nonVibrantImageView;
     if (!(alpha < 1))
         std::swap(shown, other);
@@ -271,7 +271,7 @@ void Cell::showArtwork() {
     shown->setHidden(_transitItem && _transitItem->isArtworkHidden());
 }
 
-std::shared_ptr<ArtworkImageView> Cell::artworkImageViewInVibrantImageView() const {
+std::shared_ptr<ArtworkImageView> Cell::_artworkImageViewInVibrantImageView() const {
     return std::dynamic_pointer_cast<ArtworkImageView>(_vibrantImageView->wrappedView());
 }
 

@@ -64,13 +64,13 @@ protected:
     [[nodiscard]] virtual std::vector<std::shared_ptr<NSLayoutConstraint>> _initialConstraints();
 
 private:
-    void createTexts();
-    void createArtworkViews();
-    [[nodiscard]] std::vector<std::shared_ptr<NSLayoutConstraint>> guideConstraints();
-    [[nodiscard]] std::vector<std::shared_ptr<NSLayoutConstraint>> textConstraints();
-    [[nodiscard]] std::vector<std::shared_ptr<NSLayoutConstraint>> artworkConstraints();
-    [[nodiscard]] std::shared_ptr<ArtworkImageView> artworkImageViewInVibrantImageView() const;
-    void showArtwork();
+    void _createTexts();
+    void _createArtworkViews();
+    [[nodiscard]] std::vector<std::shared_ptr<NSLayoutConstraint>> _guideConstraints();
+    [[nodiscard]] std::vector<std::shared_ptr<NSLayoutConstraint>> _textConstraints();
+    [[nodiscard]] std::vector<std::shared_ptr<NSLayoutConstraint>> _artworkConstraints();
+    [[nodiscard]] std::shared_ptr<ArtworkImageView> _artworkImageViewInVibrantImageView() const;
+    void _showArtwork();
 
     std::shared_ptr<UIStackView> _stackView;
     std::shared_ptr<UILayoutGuide> _contentGuide;

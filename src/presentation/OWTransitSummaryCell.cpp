@@ -75,12 +75,12 @@ void Cell::_createSubviews() {
     _stackView->setDistribution(UIStackViewDistribution::Fill);
     _stackView->setAlignment(UIStackViewAlignment::Fill);
     contentView()->addSubview(_stackView);
-    createTitle();
-    createShields();
+    _createTitle();
+    _createShields();
     NSLayoutConstraint::activateConstraints(_initialConstraints());
 }
 
-void Cell::createTitle() {
+void Cell::_createTitle() {
     _vibrancyViewForPrimaryLabel = VisualEffectWrappingView::initWithEffect(
         UIVibrancyEffect::widgetEffectForVibrancyStyle(PrimaryVibrancy));
     _vibrancyViewForPrimaryLabel->setIdentifier("vibrancyViewForPrimaryLabel");
@@ -99,7 +99,7 @@ void Cell::createTitle() {
 }
 
 /// Outside any vibrancy: shields keep the colours of their lines.
-void Cell::createShields() {
+void Cell::_createShields() {
     _artworksLabel =
         TransitInfoLabelView::initWithLabelItems_iconSize_shieldSize_spaceBetweenShields_maxWidth(
             nullptr, ShieldSize, ShieldSize, ShieldSpacing, TransitInfoLabelViewNoMaximumWidth);

@@ -78,8 +78,8 @@ protected:
     virtual void _updateLayout();
 
 private:
-    void createTitle();
-    void createShields();
+    void _createTitle();
+    void _createShields();
 
     std::shared_ptr<UIStackView> _stackView;
     std::shared_ptr<UILayoutGuide> _contentGuide;

@@ -32,11 +32,11 @@ public:
     explicit Column(const std::shared_ptr<NSArray>& artworks)
         : _screenScale(UIScreen::mainScreen()->scale())
         , _artworks(typed<SizedTransitArtwork>(artworks)) {
-        sort();
+        _sort();
     }
 
     [[nodiscard]] bool isEmpty() const noexcept { return _artworks.empty(); }
-    [[nodiscard]] Artwork widest() const { return currentForm(_artworks.back()); }
+    [[nodiscard]] Artwork widest() const { return _currentForm(_artworks.back()); }
     [[nodiscard]] double imageWidth(const Artwork& form) const {
         const auto image = form->imageToDisplayWithScreenScale_nightMode(_screenScale, false);
         return image ? image->size().width : 0;
@@ -48,20 +48,20 @@ public:
             SizedTransitArtwork::initWithArtwork_shieldSize_artworkCache(
                 form->artwork(), form->shieldSize() - 1, form->artworkCache()),
             _artworks.back());
-        sort();
+        _sort();
     }
     [[nodiscard]] const std::shared_ptr<NSMapTable>& replacements() const noexcept {
         return _replacements;
     }
 
 private:
-    [[nodiscard]] Artwork currentForm(const Artwork& initial) const {
+    [[nodiscard]] Artwork _currentForm(const Artwork& initial) const {
         const auto replacement = _replacements->objectForKey(initial);
         return replacement ? std::dynamic_pointer_cast<SizedTransitArtwork>(replacement) : initial;
     }
-    void sort() {
+    void _sort() {
         std::ranges::stable_sort(
-            _artworks, {}, [this](const Artwork& one) { return imageWidth(currentForm(one)); });
+            _artworks, {}, [this](const Artwork& one) { return imageWidth(_currentForm(one)); });
     }
 
     double _screenScale;

@@ -118,16 +118,16 @@ std::shared_ptr<OWTransitListItem> OWTransitIncidentsDataSourceBuilder::listItem
 std::shared_ptr<OWTransitListItem> OWTransitIncidentsDataSourceBuilder::_buildTransitListItem() {
     const auto lines = typed<TransitLineItem>(_lineItems);
     if (lines.empty())
-        return noFavoritesListItem();
+        return _noFavoritesListItem();
     _OWDisplayedIncidents displayed;
     for (const auto& line : lines)
-        collectLine(line, displayed);
+        _collectLine(line, displayed);
     _updateItemsAffectingSeveralLines_itemToLinesMap(displayed.rows());
-    recordDisplayed(displayed.incidents(), displayed.incidentsToLineMapping());
-    return shapedListItem(displayed);
+    _recordDisplayed(displayed.incidents(), displayed.incidentsToLineMapping());
+    return _shapedListItem(displayed);
 }
 
-void OWTransitIncidentsDataSourceBuilder::recordDisplayed(
+void OWTransitIncidentsDataSourceBuilder::_recordDisplayed(
     const std::vector<std::shared_ptr<TransitIncident>>& incidents,
     const std::shared_ptr<NSMapTable>& mapping) const {
     if (_analytics)
@@ -136,8 +136,8 @@ void OWTransitIncidentsDataSourceBuilder::recordDisplayed(
 }
 
 std::shared_ptr<OWTransitListItem>
-OWTransitIncidentsDataSourceBuilder::noFavoritesListItem() const {
-    recordDisplayed({}, NSMapTable::identityMapTable());
+OWTransitIncidentsDataSourceBuilder::_noFavoritesListItem() const {
+    _recordDisplayed({}, NSMapTable::identityMapTable());
     auto title = WidgetTexts::noFavoritesTitle();
     const auto item =
         OWTransitItem::initWithPrimaryText_secondaryText_artwork_artworkHidden_openable(
@@ -149,8 +149,8 @@ OWTransitIncidentsDataSourceBuilder::noFavoritesListItem() const {
     return OWTransitListItem::initWithSummaryItem_expandedItems(item, NSArray::array());
 }
 
-void OWTransitIncidentsDataSourceBuilder::collectLine(const std::shared_ptr<TransitLineItem>& line,
-                                                      _OWDisplayedIncidents& displayed) {
+void OWTransitIncidentsDataSourceBuilder::_collectLine(const std::shared_ptr<TransitLineItem>& line,
+                                                       _OWDisplayedIncidents& displayed) {
     bool hasRow = false;
     const auto incidents = typed<TransitIncident>(line->incidents());
     for (std::size_t index = 0; index < incidents.size(); ++index) {
@@ -185,12 +185,12 @@ std::shared_ptr<OWTransitItem> OWTransitIncidentsDataSourceBuilder::_itemForInci
     return OWTransitItem::initWithPrimaryText_secondaryText_artwork_artworkHidden_openable(
         std::move(title),
         std::move(secondaryText),
-        sizedArtwork(artworkOfLine(*line)),
+        _sizedArtwork(artworkOfLine(*line)),
         false,
-        activityOfLine(line));
+        _activityOfLine(line));
 }
 
-std::shared_ptr<OWUserActivityData> OWTransitIncidentsDataSourceBuilder::activityOfLine(
+std::shared_ptr<OWUserActivityData> OWTransitIncidentsDataSourceBuilder::_activityOfLine(
     const std::shared_ptr<TransitLineItem>& line) const {
     if (_packedLine != line) {
         _payloadOfPackedLine = payloadOfLine(line);
@@ -199,7 +199,7 @@ std::shared_ptr<OWUserActivityData> OWTransitIncidentsDataSourceBuilder::activit
     return lineActivity(_payloadOfPackedLine);
 }
 
-std::shared_ptr<OWConfiguredArtwork> OWTransitIncidentsDataSourceBuilder::sizedArtwork(
+std::shared_ptr<OWConfiguredArtwork> OWTransitIncidentsDataSourceBuilder::_sizedArtwork(
     const std::shared_ptr<TransitArtworkDataSource>& artwork) const {
     return OWConfiguredArtwork::initWithArtworkSource_alpha(
         SizedTransitArtwork::initWithArtwork_shieldSize_artworkCache(
@@ -232,13 +232,13 @@ void OWTransitIncidentsDataSourceBuilder::_updateItemsAffectingSeveralLines_item
             row.item->primaryText(),
             WidgetTexts::_prependLineNames_toText({row.lines.begin(), row.lines.end()},
                                                   row.item->secondaryText()),
-            sharedArtwork(row.lines),
+            _sharedArtwork(row.lines),
             row.item->isArtworkHidden(),
             row.item->openable());
     }
 }
 
-std::shared_ptr<OWConfiguredArtwork> OWTransitIncidentsDataSourceBuilder::sharedArtwork(
+std::shared_ptr<OWConfiguredArtwork> OWTransitIncidentsDataSourceBuilder::_sharedArtwork(
     const std::vector<std::shared_ptr<TransitLineItem>>& lines) const {
     // The systems' artwork, never the lines' own. Lines before the first that has one are passed
     // over; after it, one that has none, or another, makes the row generic.
@@ -251,12 +251,12 @@ std::shared_ptr<OWConfiguredArtwork> OWTransitIncidentsDataSourceBuilder::shared
         else if (!sameTransitArtwork(reference, artwork))
             isGeneric = true;
     }
-    return reference && !isGeneric ? sizedArtwork(reference)
+    return reference && !isGeneric ? _sizedArtwork(reference)
                                    : imageArtwork("WidgetGenericTransit", GenericAlpha);
 }
 
 std::shared_ptr<OWTransitListItem>
-OWTransitIncidentsDataSourceBuilder::shapedListItem(_OWDisplayedIncidents& displayed) const {
+OWTransitIncidentsDataSourceBuilder::_shapedListItem(_OWDisplayedIncidents& displayed) const {
     Rows rows;
     for (const auto& row : displayed.rows())
         rows.push_back(row.item);
@@ -283,11 +283,11 @@ OWTransitIncidentsDataSourceBuilder::shapedListItem(_OWDisplayedIncidents& displ
     if (hasOneAdvisory && !hasClearLines)
         rows.clear(); // the one row is the compact one already
     else if (!hasOneAdvisory)
-        cutOverflow(rows, displayed);
+        _cutOverflow(rows, displayed);
     return OWTransitListItem::initWithSummaryItem_expandedItems(summary, NSArray::arrayOf(rows));
 }
 
-void OWTransitIncidentsDataSourceBuilder::cutOverflow(
+void OWTransitIncidentsDataSourceBuilder::_cutOverflow(
     Rows& rows, const _OWDisplayedIncidents& displayed) const {
     const std::size_t count = rows.size();
     if (count <= _maxNumberOfItems)

@@ -79,22 +79,22 @@ public:
 private:
     using Rows = std::vector<std::shared_ptr<OWTransitItem>>;
 
-    void recordDisplayed(const std::vector<std::shared_ptr<TransitIncident>>& incidents,
-                         const std::shared_ptr<NSMapTable>& mapping) const;
-    [[nodiscard]] std::shared_ptr<OWTransitListItem> noFavoritesListItem() const;
-    void collectLine(const std::shared_ptr<TransitLineItem>& line,
-                     _OWDisplayedIncidents& displayed);
+    void _recordDisplayed(const std::vector<std::shared_ptr<TransitIncident>>& incidents,
+                          const std::shared_ptr<NSMapTable>& mapping) const;
+    [[nodiscard]] std::shared_ptr<OWTransitListItem> _noFavoritesListItem() const;
+    void _collectLine(const std::shared_ptr<TransitLineItem>& line,
+                      _OWDisplayedIncidents& displayed);
     [[nodiscard]] std::shared_ptr<OWTransitListItem>
-    shapedListItem(_OWDisplayedIncidents& displayed) const;
-    void cutOverflow(Rows& rows, const _OWDisplayedIncidents& displayed) const;
+    _shapedListItem(_OWDisplayedIncidents& displayed) const;
+    void _cutOverflow(Rows& rows, const _OWDisplayedIncidents& displayed) const;
     /// As `_userActivityDataForLineItem`. What the rows of a line hand over is packed once for all
     /// of them: it holds every incident of the line, and a feed can have thousands.
     [[nodiscard]] std::shared_ptr<OWUserActivityData>
-    activityOfLine(const std::shared_ptr<TransitLineItem>& line) const;
+    _activityOfLine(const std::shared_ptr<TransitLineItem>& line) const;
     [[nodiscard]] std::shared_ptr<OWConfiguredArtwork>
-    sizedArtwork(const std::shared_ptr<TransitArtworkDataSource>& artwork) const;
+    _sizedArtwork(const std::shared_ptr<TransitArtworkDataSource>& artwork) const;
     [[nodiscard]] std::shared_ptr<OWConfiguredArtwork>
-    sharedArtwork(const std::vector<std::shared_ptr<TransitLineItem>>& lines) const;
+    _sharedArtwork(const std::vector<std::shared_ptr<TransitLineItem>>& lines) const;
 
     std::shared_ptr<NSArray> _lineItems;
     std::uint64_t _maxNumberOfItems = 0;

@@ -167,7 +167,7 @@ void OWTransitIncidentsViewController::viewWillTransitionToSize_withTransitionCo
             if (!self || !self->_tableViewNeedsReload)
                 return;
             self->_tableViewNeedsReload = false;
-            self->reloadRows();
+            self->_reloadRows();
         },
         {});
 }
@@ -177,7 +177,7 @@ void OWTransitIncidentsViewController::didReceiveMemoryWarning() {
     artworkCache()->purge();
 }
 
-void OWTransitIncidentsViewController::reloadRows() {
+void OWTransitIncidentsViewController::_reloadRows() {
     _tableView->reloadSections_withRowAnimation({0}, UITableViewRowAnimation::Automatic);
 }
 
@@ -304,7 +304,7 @@ void OWTransitIncidentsViewController::dataSourceDidUpdateContent(
     }
     const auto size =
         _dataSource->preferredContentSizeForExpanded_maxSize(_dataSource->isExpanded(), maximum);
-    reloadRows();
+    _reloadRows();
     setPreferredContentSize(size);
 }
 

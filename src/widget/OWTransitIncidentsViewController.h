@@ -127,7 +127,7 @@ protected:
                                  const std::shared_ptr<NSObject>& bundle);
 
 private:
-    void reloadRows();
+    void _reloadRows();
 
     bool _visible = false;
     bool _tableViewNeedsReload = false; // nothing sets it; the way that it opens stays closed

@@ -20,7 +20,7 @@ std::string textOf(const std::shared_ptr<NSDate>& date) {
     return date ? std::to_string(date->timeIntervalSince1970()) : "nil";
 }
 
-std::string affected(const FeedTransitIncident& incident) {
+std::string entitiesOf(const FeedTransitIncident& incident) {
     std::string text;
     for (const auto& entity : typed<TransitIncidentAffectedEntity>(incident.affectedEntities())) {
         text += " " + std::to_string(entity->muid());
@@ -51,7 +51,7 @@ std::string told(const FeedTransitIncident& incident) {
         text += '|' + textOf(date);
     return text + '|' + nameOf(details.severity) + nameOf(details.effect) + nameOf(details.cause) +
            (incident.isBlockingIncident() ? "|blocking" : "") +
-           (details.isPartOfLine ? "|part" : "") + affected(incident);
+           (details.isPartOfLine ? "|part" : "") + entitiesOf(incident);
 }
 
 std::string told(const LineIncidents& line) {
@@ -181,8 +181,8 @@ TEST(SomeLines, AnAlertGivenInTwoPartsConcernsTheLinesOfBoth) {
     const std::string bytes = message(
         std::vector<Wire>{one.entity(), other.entity().bytes(5, Wire().bytes(5, ofAgency("M1")))});
     const Answer some({source(bytes)}, {std::vector{lineMuid("town", "R1")}, Now, "en", false});
-    EXPECT_EQ(affected(*some.incidents("R1").at(0)),
-              affected(*Answer(bytes).incidents("R1").at(0)));
+    EXPECT_EQ(entitiesOf(*some.incidents("R1").at(0)),
+              entitiesOf(*Answer(bytes).incidents("R1").at(0)));
 }
 
 TEST(SomeLines, AffectedEntitiesAreTheSameHoweverOftenTheyAreAskedFor) {
@@ -195,8 +195,8 @@ TEST(SomeLines, AffectedEntitiesAreTheSameHoweverOftenTheyAreAskedFor) {
     const auto& incident = *some.incidents("R1").at(0);
     const std::string expected = " " + std::to_string(lineMuid("town", "R1")) + " " +
                                  std::to_string(lineMuid("town", "R3")) + "/S1";
-    EXPECT_EQ(affected(incident), expected);
-    EXPECT_EQ(affected(incident), expected);
+    EXPECT_EQ(entitiesOf(incident), expected);
+    EXPECT_EQ(entitiesOf(incident), expected);
 }
 
 TEST(SomeLines, ATitleThatOnlyNamesALineThatWasNotAskedAboutIsTheEffect) {
@@ -236,7 +236,7 @@ TEST(SomeLines, AffectedEntitiesCanBeAskedForWhenTheMessageAndTheBuilderAreGone)
     std::string expected;
     for (const char* const route : {"R1", "R2", "R3", "T1"})
         expected += " " + std::to_string(lineMuid("town", route));
-    EXPECT_EQ(affected(*incident), expected);
+    EXPECT_EQ(entitiesOf(*incident), expected);
 }
 
 } // namespace orvo::testing
