@@ -147,11 +147,13 @@ TEST(IncidentMerger, TheNumberIsTheSameEverywhereAndAnotherInAnotherFeed) {
 }
 
 TEST(IncidentMerger, RepeatsAreFoundAmongManyAndKeepTheFirstOnesPlace) {
+    std::deque<std::string> ids; // views into these
     std::deque<std::string> headers;
     std::deque<Alert> alerts;
     for (int i = 0; i < 30; ++i) {
+        ids.push_back(std::to_string(i));
         headers.push_back("Delay on line " + std::to_string(i % 10));
-        alerts.push_back(alert(std::to_string(i), {{headers.back(), "en"}}));
+        alerts.push_back(alert(ids.back(), {{headers.back(), "en"}}));
     }
     alerts[17].header[0].text = "<i>Delay on line&nbsp;7</i>";
     const auto incidents = merge(alerts);
