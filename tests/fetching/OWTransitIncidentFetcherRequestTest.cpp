@@ -5,6 +5,7 @@
 #include <gtest/gtest.h>
 
 #include <atomic>
+#include <functional>
 #include <latch>
 #include <memory>
 #include <string>
@@ -224,6 +225,63 @@ TEST(IncidentFetcherRequest, TheListIsCopiedAfterTheResultIsStored) {
     const auto result = makeResult();
     request->setResultAndInvokeCompletionHandlers(result);
     EXPECT_EQ(state.resultSeen, result);
+}
+
+/// A handler that does something once when it is copied: that is while the list is copied, and the
+/// lock held.
+class ActingWhenCopied {
+public:
+    explicit ActingWhenCopied(std::function<void()>* action)
+        : _action(action) {}
+    ActingWhenCopied(const ActingWhenCopied& other)
+        : _action(other._action) {
+        if (const auto action = std::exchange(*_action, nullptr))
+            action();
+    }
+    ActingWhenCopied& operator=(const ActingWhenCopied&) = delete;
+    ~ActingWhenCopied() = default;
+    void operator()(const std::shared_ptr<Result>&) const {}
+
+private:
+    std::function<void()>* _action;
+};
+
+/// Lets a request end, `patience` turns after another thread began to add a handler, while the lock
+/// keeps that handler out of the list. Answers whether the handler was called; it is in the list
+/// exactly when it was not.
+bool callsAHandlerAddedWhileItEnds(int patience) {
+    const auto request = Request::initWithCompletionHandler(nullptr);
+    std::function<void()> whileLocked;
+    request->addHandler(ActingWhenCopied(&whileLocked));
+    std::atomic<bool> adding = false;
+    std::atomic<std::size_t> calls = 0;
+    std::thread joiner;
+    whileLocked = [&] {
+        joiner = std::thread([&] {
+            adding = true;
+            request->addHandler([&](const auto&) { ++calls; });
+        });
+        while (!adding)
+            std::this_thread::yield();
+        for (int turn = 0; turn < patience; ++turn)
+            std::this_thread::yield();
+        request->setResultAndInvokeCompletionHandlers(makeResult());
+    };
+    (void)request->handlers();
+    joiner.join();
+    EXPECT_EQ(request->handlers().size() + calls, 2U);
+    return calls == 1;
+}
+
+TEST(IncidentFetcherRequest,
+     AHandlerThatLookedForTheResultBeforeTheEndAndCameAfterItIsNeverCalled) {
+    // Nothing shows that the other thread has looked and waits for the lock, so it is given more
+    // and more turns for that.
+    constexpr int enough = 1 << 20;
+    int patience = 1;
+    while (patience < enough && callsAHandlerAddedWhileItEnds(patience))
+        patience *= 2;
+    EXPECT_LT(patience, enough);
 }
 
 /// Handlers that know how often they were called, and a probe for which of them are in the list.

@@ -456,14 +456,21 @@ TEST_F(IncidentFetcher, TheInjectionSwitchIsReadAtEveryLookup) {
     }
 }
 
-TEST_F(IncidentFetcher, TheLoggedCountIsThatAfterTheInjection) {
-    const auto random = Environment::random().overrideWith([] { return 1U; });
+TEST_F(IncidentFetcher, TheInjectionIsOverBeforeTheCountIsLogged) {
+    std::vector<std::string> loggedAtLastDraw;
+    const auto random = Environment::random().overrideWith([&] {
+        loggedAtLastDraw = widgetMessages();
+        return 1U;
+    });
     OrvoGroup::__orvo_groupUserDefaults()->setBool_forKey(true, injectKey);
     saveLines({1});
     lookup->answerWith({NSArray::arrayOf({makeItem(1), makeItem(2), makeItem(3)}), nullptr});
-    const auto value = valueOf(fetch());
-    EXPECT_EQ(value->count(), 3U);
-    EXPECT_EQ(widgetMessages().back(), "Received 3 line items.");
+    EXPECT_EQ(valueOf(fetch())->count(), 3U);
+    auto logged = widgetMessages();
+    ASSERT_EQ(logged.size(), 3U);
+    EXPECT_EQ(logged.back(), "Received 3 line items.");
+    logged.pop_back();
+    EXPECT_EQ(loggedAtLastDraw, logged);
 }
 
 TEST_F(IncidentFetcher, NoInjectionIntoAFailure) {

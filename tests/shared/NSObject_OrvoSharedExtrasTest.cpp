@@ -157,6 +157,18 @@ TEST_F(NeedsUpdate, ARequestThatIsWithdrawnPerformsNothing) {
     EXPECT_EQ(screen->count(layOut), 0);
 }
 
+TEST_F(NeedsUpdate, CanBeRequestedAgainAfterABatchWhoseOnlyRequestWasWithdrawn) {
+    const long before = screen.use_count();
+    _orvo_setNeedsUpdateWithSelector(screen, layOut);
+    _orvo_setNeedsUpdate_withSelector(screen, false, layOut);
+    runMainQueue();
+    EXPECT_EQ(screen.use_count(), before); // the batch has run, though it had nothing to perform
+    _orvo_setNeedsUpdateWithSelector(screen, layOut);
+    EXPECT_EQ(screen.use_count(), before + 1); // and the request schedules another
+    runMainQueue();
+    EXPECT_EQ(screen->count(layOut), 1);
+}
+
 TEST_F(NeedsUpdate, WithdrawingLeavesTheBatchScheduledForTheOthers) {
     _orvo_setNeedsUpdateWithSelector(screen, layOut);
     const long withOneBlock = screen.use_count();

@@ -6,6 +6,8 @@
 
 #include <gtest/gtest.h>
 
+#include <limits>
+#include <memory>
 #include <thread>
 
 namespace orvo {
@@ -82,6 +84,39 @@ TEST_F(TimerWithFireDate, ADatePassedIsReachedAtOnceButNotInsideTheCall) {
     RunLoop::current().checkTimers();
     EXPECT_EQ(called, 1);
     EXPECT_FALSE(late->isValid());
+}
+
+/// Shows `now`, but when it is read first after a timer was scheduled: there it shows the last
+/// moment that a clock can show, and the run loop looks at its timers.
+class LeapingClock final : public WallClock {
+public:
+    double timeIntervalSinceReferenceDate() const override {
+        if (!_leaping && !_hasLeapt && RunLoop::current().scheduledTimers() > 0) {
+            _leaping = true;
+            RunLoop::current().checkTimers();
+            _leaping = false;
+            _hasLeapt = true;
+        }
+        return _leaping ? std::numeric_limits<double>::max() : now - NSTimeIntervalSince1970;
+    }
+    [[nodiscard]] bool hasLeapt() const { return _hasLeapt; }
+
+private:
+    mutable bool _leaping = false;
+    mutable bool _hasLeapt = false;
+};
+
+TEST_F(TimerWithFireDate, CannotFireBeforeItsDateIsSetHoweverFarTheClockLeapsUntilThen) {
+    timer->invalidate(); // or its date would be passed too
+    const auto leaping = std::make_shared<LeapingClock>();
+    const auto leapingClock = Environment::wallClock().overrideWith(leaping);
+    const auto date = NSDate::dateWithTimeIntervalSince1970(now + 600);
+    int called = 0;
+    timer = _orvo_scheduledTimerWithFireDate_block(date, [&](const auto&) { ++called; });
+    EXPECT_TRUE(leaping->hasLeapt());
+    EXPECT_EQ(called, 0);
+    EXPECT_TRUE(timer->isValid());
+    EXPECT_TRUE(equal(timer->fireDate(), date));
 }
 
 TEST_F(TimerWithFireDate, NeedsADateAndABlockAndSchedulesNothingWithoutThem) {

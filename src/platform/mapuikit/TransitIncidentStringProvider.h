@@ -8,8 +8,9 @@
 
 namespace orvo {
 
-/// Gives an incident its texts in a list: each on one line, line breaks and repeated blanks become
-/// one blank. Any thread.
+/// Gives an incident its texts in a list, each on one line: line breaks, tabs and repeated blanks
+/// of ASCII and the two separators of Unicode become one blank, and none stands at either end. A
+/// text of nothing else is empty, not nil. Any thread.
 class TransitIncidentStringProvider : public virtual NSObject {
 public:
     [[nodiscard]] static std::shared_ptr<TransitIncidentStringProvider> sharedProvider();
