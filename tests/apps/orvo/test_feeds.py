@@ -93,7 +93,10 @@ class Incidents(ProgramTest):
 
     def test_an_old_message_proves_nothing(self):
         self.add(timestamp=NOW - 25 * HOUR)
-        self.refused(1, "incidents", "--at", AT)
+        answer = self.orvo("incidents", "--at", AT)
+        self.assertEqual(answer.out.count("Status unknown"), 2)
+        self.assertNotIn("Good service", answer.out)
+        self.assertIn("more than a day old", answer.err)
 
     def test_a_line_that_left_its_schedule_is_unknown(self):
         self.add()
