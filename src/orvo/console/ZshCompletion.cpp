@@ -18,7 +18,7 @@ std::string zshAction(Completes what, const std::vector<std::string>& words) {
     return words.empty() ? " " : fmt::format("({})", fmt::join(words, " "));
 }
 
-/// Brackets and colons have a meaning inside an `_arguments` specification.
+/// Brackets and colons have a meaning in what `_arguments` is told.
 std::string zshText(const std::string& text) {
     std::string result;
     for (const char c : text) {
