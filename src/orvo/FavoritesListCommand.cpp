@@ -56,7 +56,7 @@ row(std::size_t number, const NSObject& favorite, const ScheduleStore* schedules
         place ? fmt::format("{:.5g}, {:.5g}", place->latitude(), place->longitude()) : "";
     return {fmt::format("{}", number),
             FavoriteReference::lineNameOf(favorite).value_or(place ? "(place)" : ""),
-            FavoriteReference::nameOf(favorite, schedules),
+            line ? line->name().value_or("") : FavoriteReference::nameOf(favorite, nullptr),
             line ? systemName(*line).value_or("") : where};
 }
 

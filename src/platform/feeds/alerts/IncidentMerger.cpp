@@ -135,6 +135,8 @@ std::string_view IncidentMerger::normalised(const AlertText* text) {
         return {};
     std::string room;
     const std::string_view line = IncidentContent::normalised(text->text, room);
+    if (line.empty()) // whatever it views
+        return {};
     return room.empty() ? line : _normalised.emplace_back(std::move(room));
 }
 

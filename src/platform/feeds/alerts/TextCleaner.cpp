@@ -12,6 +12,7 @@
 #include <algorithm>
 #include <memory>
 #include <type_traits>
+#include <utility>
 
 namespace orvo {
 
@@ -168,7 +169,7 @@ std::string clean(std::string_view text) {
 std::string cleanLine(std::string_view text) {
     std::string room;
     const std::string_view line = cleanLine(text, room);
-    return room.empty() ? std::string(line) : room;
+    return room.empty() ? std::string(line) : std::move(room);
 }
 
 std::string_view cleanLine(std::string_view text, std::string& room) {
