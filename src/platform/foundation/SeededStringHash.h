@@ -3,10 +3,12 @@
 #include <cstddef>
 #include <cstdint>
 #include <functional>
+#include <memory>
 #include <string>
 #include <string_view>
 #include <unordered_map>
 #include <unordered_set>
+#include <utility>
 
 namespace orvo {
 
@@ -31,14 +33,22 @@ struct SeededNumberHash {
 };
 
 /// Tables of foreign text. Those with `std::string` keys are asked with views as well.
-template <class Key, class Value>
-using SeededTextMap = std::unordered_map<Key, Value, SeededStringHash, std::equal_to<>>;
+template <class Key, class Value, template <class> class Allocator = std::allocator>
+using SeededTextMap = std::unordered_map<Key,
+                                         Value,
+                                         SeededStringHash,
+                                         std::equal_to<>,
+                                         Allocator<std::pair<const Key, Value>>>;
 template <class Key>
 using SeededTextSet = std::unordered_set<Key, SeededStringHash, std::equal_to<>>;
 
 /// Tables of such numbers.
-template <class Value>
-using SeededNumberMap = std::unordered_map<std::uint64_t, Value, SeededNumberHash>;
+template <class Value, template <class> class Allocator = std::allocator>
+using SeededNumberMap = std::unordered_map<std::uint64_t,
+                                           Value,
+                                           SeededNumberHash,
+                                           std::equal_to<>,
+                                           Allocator<std::pair<const std::uint64_t, Value>>>;
 using SeededNumberSet = std::unordered_set<std::uint64_t, SeededNumberHash>;
 
 } // namespace orvo

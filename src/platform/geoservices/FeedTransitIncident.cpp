@@ -1,6 +1,7 @@
 #include "platform/geoservices/FeedTransitIncident.h"
 
 #include <array>
+#include <utility>
 
 namespace orvo {
 
@@ -54,10 +55,30 @@ std::string nameOf(IncidentCause cause) {
 
 std::shared_ptr<FeedTransitIncident> FeedTransitIncident::initWithFields_details(Fields fields,
                                                                                  Details details) {
+    Occurrence occurrence{fields.startDate,
+                          fields.endDate,
+                          fields.isBlockingIncident,
+                          details.isPartOfLine,
+                          details.timeZone};
+    return initWithCommon_occurrence(
+        std::make_shared<const Common>(Common{std::move(fields), std::move(details)}),
+        std::move(occurrence));
+}
+
+std::shared_ptr<FeedTransitIncident>
+FeedTransitIncident::initWithCommon_occurrence(std::shared_ptr<const Common> common,
+                                               Occurrence occurrence) {
     auto incident = std::make_shared<FeedTransitIncident>();
-    incident->_initWithFields(std::move(fields));
-    incident->_details = std::move(details);
+    incident->_common = std::move(common);
+    incident->_occurrence = std::move(occurrence);
     return incident;
+}
+
+FeedTransitIncident::Details FeedTransitIncident::details() const {
+    Details details = _common->details;
+    details.isPartOfLine = _occurrence.isPartOfLine;
+    details.timeZone = _occurrence.timeZone;
+    return details;
 }
 
 } // namespace orvo

@@ -59,9 +59,13 @@ public:
     [[nodiscard]] virtual std::shared_ptr<NSArray> affectedEntities() const = 0;
 };
 
-/// An incident of a public feed, with what the platform's record has no place for.
-class FeedTransitIncident final : public TransitIncidentRecord {
+/// An incident of a public feed, with what the platform's record has no place for. Immutable. One
+/// incident has many objects, for its periods and for lines that it concerns in another way: they
+/// share what they have in common.
+class FeedTransitIncident final : public TransitIncident {
 public:
+    using Fields = TransitIncidentRecord::Fields;
+
     struct Details {
         std::string feed; ///< the feed's short name
         IncidentSeverity severity = IncidentSeverity::Unknown;
@@ -69,6 +73,9 @@ public:
         IncidentCause cause = IncidentCause::UnknownCause;
         bool isPartOfLine = false; ///< only stops or trips of the line are concerned
         bool isUnknown = false;    ///< no incident at all: a status that could not be proven
+        /// The summary is the whole description: it is given once, and the field
+        /// `fullDescription` is nil.
+        bool isSummaryWhole = false;
         std::optional<std::string> spokenTitle; ///< as a voice should say it
         std::optional<std::string> link;        ///< a web page about it
         std::optional<std::string> timeZone;    ///< the agency's, an IANA name
@@ -76,34 +83,80 @@ public:
         std::shared_ptr<const AffectedEntitySource> entitySource;
     };
 
+    /// What objects of one incident share. Of what an occurrence has as well, only that counts.
+    struct Common {
+        Fields fields;
+        Details details;
+    };
+
+    /// In what they differ.
+    struct Occurrence {
+        std::shared_ptr<NSDate> startDate;
+        std::shared_ptr<NSDate> endDate;
+        bool isBlockingIncident = false;
+        bool isPartOfLine = false;
+        std::optional<std::string> timeZone;
+    };
+
     [[nodiscard]] static std::shared_ptr<FeedTransitIncident>
     initWithFields_details(Fields fields, Details details);
+    [[nodiscard]] static std::shared_ptr<FeedTransitIncident>
+    initWithCommon_occurrence(std::shared_ptr<const Common> common, Occurrence occurrence);
 
-    [[nodiscard]] const Details& details() const noexcept { return _details; }
+    [[nodiscard]] Details details() const;
+    [[nodiscard]] const Occurrence& occurrence() const noexcept { return _occurrence; }
+    [[nodiscard]] IncidentSeverity severity() const noexcept { return _common->details.severity; }
+    [[nodiscard]] IncidentEffect effect() const noexcept { return _common->details.effect; }
 
+    [[nodiscard]] std::uint64_t muid() const override { return _common->fields.muid; }
+    [[nodiscard]] std::shared_ptr<NSDate> startDate() const override {
+        return _occurrence.startDate;
+    }
+    [[nodiscard]] std::shared_ptr<NSDate> endDate() const override { return _occurrence.endDate; }
+    [[nodiscard]] bool isBlockingIncident() const override {
+        return _occurrence.isBlockingIncident;
+    }
+    [[nodiscard]] std::optional<std::string> title() const override {
+        return _common->fields.title;
+    }
+    [[nodiscard]] std::optional<std::string> summary() const override {
+        return _common->fields.summary;
+    }
+    [[nodiscard]] std::optional<std::string> fullDescription() const override {
+        return _common->details.isSummaryWhole ? _common->fields.summary
+                                               : _common->fields.fullDescription;
+    }
     /// Feeds have one short text for whatever a rider is about to do: where the fields have no
     /// message, it is the title.
     [[nodiscard]] std::optional<std::string> messageForRoutePlanning() const override {
-        return orTitle(fields().messageForRoutePlanning);
+        return orTitle(_common->fields.messageForRoutePlanning);
     }
     [[nodiscard]] std::optional<std::string> messageForRouteStepping() const override {
-        return orTitle(fields().messageForRouteStepping);
+        return orTitle(_common->fields.messageForRouteStepping);
     }
     [[nodiscard]] std::optional<std::string> messageForNonRoutable() const override {
-        return orTitle(fields().messageForNonRoutable);
+        return orTitle(_common->fields.messageForNonRoutable);
+    }
+    [[nodiscard]] std::int32_t iconType() const override { return _common->fields.iconType; }
+    [[nodiscard]] std::shared_ptr<NSDate> creationDate() const override {
+        return _common->fields.creationDate;
+    }
+    [[nodiscard]] std::shared_ptr<NSDate> lastUpdated() const override {
+        return _common->fields.lastUpdated;
     }
     [[nodiscard]] std::shared_ptr<NSArray> affectedEntities() const override {
-        return _details.entitySource ? _details.entitySource->affectedEntities()
-                                     : fields().affectedEntities;
+        return _common->details.entitySource ? _common->details.entitySource->affectedEntities()
+                                             : _common->fields.affectedEntities;
     }
 
 private:
     [[nodiscard]] const std::optional<std::string>&
     orTitle(const std::optional<std::string>& message) const noexcept {
-        return message ? message : fields().title;
+        return message ? message : _common->fields.title;
     }
 
-    Details _details;
+    std::shared_ptr<const Common> _common;
+    Occurrence _occurrence;
 };
 
 } // namespace orvo

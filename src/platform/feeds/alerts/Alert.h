@@ -1,6 +1,7 @@
 #pragma once
 
 #include <cstdint>
+#include <memory_resource>
 #include <optional>
 #include <string_view>
 #include <vector>
@@ -31,14 +32,32 @@ struct AlertSelector {
     bool namesDeparture = false; ///< a trip's start time is given
 };
 
-/// One alert of a message, read but not judged. It is valid as long as the message's bytes are.
+/// Where the lists of alerts lie. A feed has thousands, which are thrown away together: they share
+/// one place that is given back whole.
+using AlertRoom = std::pmr::polymorphic_allocator<>;
+using AlertTexts = std::pmr::vector<AlertText>;
+using AlertPeriods = std::pmr::vector<AlertPeriod>;
+using AlertSelectors = std::pmr::vector<AlertSelector>;
+
+/// One alert of a message, read but not judged. It is valid as long as the message's bytes are, and
+/// the room.
 struct Alert {
+    explicit Alert(AlertRoom room = {})
+        : activePeriods(room)
+        , communicationPeriods(room)
+        , impactPeriods(room)
+        , selectors(room)
+        , header(room)
+        , description(room)
+        , spokenHeader(room)
+        , link(room) {}
+
     std::string_view id; ///< the entity's; empty when it has none that can be read
-    std::vector<AlertPeriod> activePeriods;
-    std::vector<AlertPeriod> communicationPeriods;
-    std::vector<AlertPeriod> impactPeriods;
-    std::vector<AlertSelector> selectors; ///< those that were read
-    bool hasUnreadSelectors = false;      ///< whether others were passed over
+    AlertPeriods activePeriods;
+    AlertPeriods communicationPeriods;
+    AlertPeriods impactPeriods;
+    AlertSelectors selectors;        ///< those that were read
+    bool hasUnreadSelectors = false; ///< whether others were passed over
     /// The fields of the alert among which all its selectors are, the read ones too: mostly nothing
     /// else. Empty for a reader that passes over none, and where they are in two places: then all
     /// of them were read.
@@ -46,10 +65,10 @@ struct Alert {
     std::int32_t cause = 1;    ///< a number of `IncidentCause`
     std::int32_t effect = 8;   ///< a number of `IncidentEffect`
     std::int32_t severity = 1; ///< a number of `IncidentSeverity`
-    std::vector<AlertText> header;
-    std::vector<AlertText> description;
-    std::vector<AlertText> spokenHeader;
-    std::vector<AlertText> link;
+    AlertTexts header;
+    AlertTexts description;
+    AlertTexts spokenHeader;
+    AlertTexts link;
 };
 
 } // namespace orvo

@@ -151,16 +151,17 @@ private:
         std::vector<bool> slots(slotMask + 1);
         for (const std::uint64_t key : chosenKeys)
             slots[key & slotMask] = true;
-        SeededNumberSet candidates; // few, and looked for exactly
+        std::vector<std::uint64_t> candidates; // few, and looked for exactly
         std::size_t key = 0;
         for (std::size_t entity = 0; entity < _isChosen.size(); ++entity) {
             const std::size_t end = _endOfKeys[entity];
             for (; key < end; ++key)
                 if (slots[_keys[key] & slotMask] && !_isChosen[entity])
-                    candidates.insert(_keys[key]);
+                    candidates.push_back(_keys[key]);
         }
+        std::ranges::sort(candidates);
         return !candidates.empty() && std::ranges::any_of(chosenKeys, [&](std::uint64_t chosen) {
-            return candidates.contains(chosen);
+            return std::ranges::binary_search(candidates, chosen);
         });
     }
 

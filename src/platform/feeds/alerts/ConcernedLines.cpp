@@ -53,7 +53,7 @@ void ConcernedLines::collect(const Incident& incident) {
 }
 
 /// Those that were read, or all.
-const std::vector<AlertSelector>& ConcernedLines::selectorsOf(const Alert& alert) {
+std::span<const AlertSelector> ConcernedLines::selectorsOf(const Alert& alert) {
     if (!_areAll || !alert.hasUnreadSelectors)
         return alert.selectors;
     _reread.clear();
@@ -63,7 +63,7 @@ const std::vector<AlertSelector>& ConcernedLines::selectorsOf(const Alert& alert
 
 /// A selector without a route may name every line of an agency: said twice by one alert it is taken
 /// once. One with a trip names none, and is no reason to pass over another with the same stop.
-void ConcernedLines::addMentions(const std::vector<AlertSelector>& selectors, std::size_t member) {
+void ConcernedLines::addMentions(std::span<const AlertSelector> selectors, std::size_t member) {
     _broad.clear();
     for (const AlertSelector& selector : selectors) {
         const bool isPart = SelectorResolver::namesPart(selector);

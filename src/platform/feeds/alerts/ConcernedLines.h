@@ -73,15 +73,15 @@ private:
     };
 
     void collect(const Incident& incident);
-    void addMentions(const std::vector<AlertSelector>& selectors, std::size_t member);
-    [[nodiscard]] const std::vector<AlertSelector>& selectorsOf(const Alert& alert);
+    void addMentions(std::span<const AlertSelector> selectors, std::size_t member);
+    [[nodiscard]] std::span<const AlertSelector> selectorsOf(const Alert& alert);
     [[nodiscard]] bool takeBroad();
     void takeMention(const Mention& mention);
     void finishLine();
 
     SelectorResolver& _resolver;
     bool _areAll = true;
-    std::vector<AlertSelector> _reread; // of an alert of which some were passed over
+    AlertSelectors _reread; // of an alert of which some were passed over
     std::vector<Line> _lines;
     std::vector<std::string_view> _stops;
     std::vector<std::size_t> _members;

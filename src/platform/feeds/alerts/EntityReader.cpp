@@ -116,7 +116,7 @@ AlertReading EntityReader::read(std::string_view entity) {
             if (reading.alert)
                 readPassedOver(*reading.alert);
             else
-                reading.alert.emplace();
+                reading.alert.emplace(_room);
             if (isBytes(cursor)) {
                 readAlert(cursor.bytes(), reading);
             } else {
@@ -224,7 +224,7 @@ void EntityReader::readAlertField(const WireCursor& field, AlertReading& reading
     }
 }
 
-void EntityReader::readPeriod(const WireCursor& field, std::vector<AlertPeriod>& periods) {
+void EntityReader::readPeriod(const WireCursor& field, AlertPeriods& periods) {
     if (periods.empty())
         periods.reserve(UsualPeriods);
     AlertPeriod period;
@@ -295,7 +295,7 @@ void EntityReader::takeSelector(const WireCursor& field, AlertReading& reading) 
     _statistics.add(AlertCount::UnreadableSelectors);
 }
 
-void EntityReader::readSelectors(std::string_view fields, std::vector<AlertSelector>& selectors) {
+void EntityReader::readSelectors(std::string_view fields, AlertSelectors& selectors) {
     WireCursor cursor(fields);
     while (cursor.next()) {
         AlertSelector selector;
@@ -320,7 +320,7 @@ void EntityReader::readNumber(const WireCursor& field,
         _statistics.add(AlertCount::UnreadableNumbers);
 }
 
-void EntityReader::readTexts(const WireCursor& field, std::vector<AlertText>& texts) {
+void EntityReader::readTexts(const WireCursor& field, AlertTexts& texts) {
     if (!isBytes(field))
         return _statistics.add(AlertCount::UnreadableTexts);
     WireCursor cursor(field.bytes());
@@ -334,7 +334,7 @@ void EntityReader::readTexts(const WireCursor& field, std::vector<AlertText>& te
         _statistics.add(AlertCount::UnreadableTexts);
 }
 
-void EntityReader::readText(std::string_view bytes, std::vector<AlertText>& texts) {
+void EntityReader::readText(std::string_view bytes, AlertTexts& texts) {
     AlertText text;
     bool isBad = false;
     WireCursor cursor(bytes);

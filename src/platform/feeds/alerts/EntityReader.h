@@ -6,7 +6,6 @@
 #include <cstddef>
 #include <optional>
 #include <string_view>
-#include <vector>
 
 namespace orvo {
 
@@ -30,10 +29,15 @@ public:
     /// @param passedOver selectors that need not be read: those that fit these shapes, and name
     /// none of their wanted routes. Nil to read all.
     ///
-    /// Statistics and shapes outlive the reader.
-    explicit EntityReader(AlertStatistics& statistics, const SelectorShapes* passedOver = nullptr)
+    /// @param room where the alerts' lists will lie
+    ///
+    /// Statistics, shapes and room outlive the reader.
+    explicit EntityReader(AlertStatistics& statistics,
+                          const SelectorShapes* passedOver = nullptr,
+                          AlertRoom room = {})
         : _statistics(statistics)
-        , _passedOver(passedOver) {}
+        , _passedOver(passedOver)
+        , _room(room) {}
 
     [[nodiscard]] AlertReading read(std::string_view entity);
 
@@ -43,7 +47,7 @@ public:
     [[nodiscard]] static bool readSelector(std::string_view bytes, AlertSelector& selector);
     /// Appends the selectors among some fields of alerts, without those that are empty or cannot be
     /// read.
-    static void readSelectors(std::string_view fields, std::vector<AlertSelector>& selectors);
+    static void readSelectors(std::string_view fields, AlertSelectors& selectors);
     /// Takes the number of an effect or a severity; an unlisted one changes nothing.
     /// @return whether it is listed
     static bool readEffect(std::uint64_t number, std::int32_t& effect) noexcept;
@@ -55,19 +59,20 @@ private:
     void readPassedOver(Alert& alert);
     void addSelectorFields(const char* begin, const char* end);
     void readAlertField(const WireCursor& field, AlertReading& reading);
-    void readPeriod(const WireCursor& field, std::vector<AlertPeriod>& periods);
+    void readPeriod(const WireCursor& field, AlertPeriods& periods);
     void takeSelector(const WireCursor& field, AlertReading& reading);
     void readNumber(const WireCursor& field,
                     bool (*take)(std::uint64_t, std::int32_t&) noexcept,
                     std::int32_t& number);
-    void readTexts(const WireCursor& field, std::vector<AlertText>& texts);
-    void readText(std::string_view bytes, std::vector<AlertText>& texts);
+    void readTexts(const WireCursor& field, AlertTexts& texts);
+    void readText(std::string_view bytes, AlertTexts& texts);
     [[nodiscard]] bool takeOne() noexcept;
 
     AlertStatistics& _statistics;
     const SelectorShapes* _passedOver;
+    AlertRoom _room;
     // Of the entity being read.
-    std::vector<AlertSelector> _selectors;
+    AlertSelectors _selectors;
     std::string_view _selectorFields;
     bool _mayPassOver = false;
     std::size_t _repeatsLeft = 1'000'000;

@@ -13,6 +13,7 @@
 #include <deque>
 #include <fmt/format.h>
 #include <functional>
+#include <memory_resource>
 #include <span>
 #include <utility>
 
@@ -44,6 +45,7 @@ public:
 
 private:
     static constexpr std::size_t NotAsked = static_cast<std::size_t>(-1);
+    static constexpr std::size_t FirstRoom = std::size_t{64} * 1024; // bytes
 
     void prepareLines() {
         if (_query.lines) {
@@ -87,15 +89,16 @@ private:
             _selection->choose();
     }
 
-    std::vector<Incident> mergeAlerts() {
-        IncidentMerger merger(_index.feed(), _index.language());
+    IncidentMerger::Incidents mergeAlerts() {
+        IncidentMerger merger(_index.feed(), _index.language(), &_room);
         _result.sources.resize(_sources.size());
         std::size_t place = 0;
         for (std::size_t source = 0; source < _sources.size(); ++source) {
             if (!_proofs[source].message)
                 continue;
             EntityReader reader(_result.sources[source].statistics,
-                                _selection ? &_selection->shapes() : nullptr);
+                                _selection ? &_selection->shapes() : nullptr,
+                                &_room);
             for (const std::string_view entity : _proofs[source].message->entities)
                 if (!_selection || _selection->isChosen(place++))
                     mergeAlert(reader.read(entity), source, merger);
@@ -115,12 +118,14 @@ private:
         merger.add(_alerts.back(), source);
     }
 
-    void buildIncidents(const std::vector<Incident>& incidents) {
+    void buildIncidents(const IncidentMerger::Incidents& incidents) {
         RecordContext context{_index.feed(),
                               _index.timezone(),
                               {},
                               IncidentWording(_query.language, _index.language()),
-                              _table};
+                              _table,
+                              &_room,
+                              {}};
         for (const SourceProof& proof : _proofs)
             context.headerDates.push_back(NSDate::dateWithTimeIntervalSince1970(proof.headerTime));
         SelectorResolver resolver(*_table, _result.statistics);
@@ -138,9 +143,8 @@ private:
         _result.statistics.add(AlertCount::UnreadableSelectors, lines.lostSelectors());
     }
 
-    void buildIncident(const RecordContext& context,
-                       const Incident& incident,
-                       const ConcernedLines& lines) {
+    void
+    buildIncident(RecordContext& context, const Incident& incident, const ConcernedLines& lines) {
         _result.statistics.add(AlertCount::Incidents);
         _result.statistics.add(AlertCount::RepeatedAlerts, incident.members.size() - 1);
         if (lines.lines().empty() && lines.areAll())
@@ -219,7 +223,7 @@ private:
             return UnknownStatus{Reason::LineDeparted, lastKnown(), {}};
         const bool isDisturbed =
             std::any_of(line.incidents.begin(), line.incidents.end(), [&](const auto& incident) {
-                const auto& start = incident->fields().startDate;
+                const auto& start = incident->occurrence().startDate;
                 return !start || start->timeIntervalSince1970() <= _query.now;
             });
         if (isDisturbed)
@@ -284,8 +288,9 @@ private:
     std::vector<std::size_t> _sameAs;  // by place in the answer: the first place of the same line
     std::optional<AlertSelection> _selection; // nothing when all lines are asked about
     std::vector<SourceProof> _proofs;
-    std::deque<Alert> _alerts;            // incidents point to them
-    std::vector<IncidentPeriod> _periods; // of the incident at hand
+    std::pmr::monotonic_buffer_resource _room{FirstRoom};
+    std::pmr::deque<Alert> _alerts{&_room}; // incidents point to them
+    std::vector<IncidentPeriod> _periods;   // of the incident at hand
     bool _hasLostSelectors = false;
     bool _hasLostStops = false; // selectors with stops may name any line
     FeedIncidents _result;

@@ -13,18 +13,18 @@ constexpr std::size_t MostUnderOneId = 16;
 /// No incident is told in more; each is compared with each.
 constexpr std::size_t MostLanguages = 100;
 
-bool hasTag(const std::vector<AlertText>& texts, std::string_view tag) {
+bool hasTag(const AlertTexts& texts, std::string_view tag) {
     return std::any_of(texts.begin(), texts.end(), [&](const AlertText& text) {
         return LanguagePreference::isSameTag(text.language, tag);
     });
 }
 
-bool sharesLanguage(const std::vector<AlertText>& a, const std::vector<AlertText>& b) {
+bool sharesLanguage(const AlertTexts& a, const AlertTexts& b) {
     return std::any_of(
         a.begin(), a.end(), [&](const AlertText& text) { return hasTag(b, text.language); });
 }
 
-void addMissingLanguages(std::vector<AlertText>& texts, const std::vector<AlertText>& more) {
+void addMissingLanguages(AlertTexts& texts, const AlertTexts& more) {
     const std::size_t known = texts.size();
     for (const AlertText& text : more)
         if (known == 0 || (texts.size() < MostLanguages && !hasTag(texts, text.language)))
@@ -39,27 +39,31 @@ void unite(Incident& incident, const Incident& other) {
     addMissingLanguages(incident.link, other.link);
 }
 
-Incident incidentOf(Alert& alert, std::size_t source) {
-    return {0,
-            alert.effect,
-            {{&alert, source}},
-            std::move(alert.header),
-            std::move(alert.description),
-            std::move(alert.spokenHeader),
-            std::move(alert.link)};
+Incident incidentOf(Alert& alert, std::size_t source, AlertRoom room) {
+    Incident incident(room);
+    incident.effect = alert.effect;
+    incident.members.push_back({&alert, source});
+    incident.header = std::move(alert.header);
+    incident.description = std::move(alert.description);
+    incident.spokenHeader = std::move(alert.spokenHeader);
+    incident.link = std::move(alert.link);
+    return incident;
 }
 
 } // namespace
 
-IncidentMerger::IncidentMerger(std::string feed, std::string_view agencyLanguage)
-    : _feed(std::move(feed))
-    , _preference(LanguagePreference::forAgency(agencyLanguage)) {}
+IncidentMerger::IncidentMerger(std::string feed, std::string_view agencyLanguage, AlertRoom room)
+    : _room(room)
+    , _feed(std::move(feed))
+    , _preference(LanguagePreference::forAgency(agencyLanguage))
+    , _incidents(room)
+    , _byId(room) {}
 
 void IncidentMerger::add(Alert& alert, std::size_t source) {
     if (source != std::exchange(_source, source))
         _byId.clear();
     if (Incident* const partner = translationPartner(alert, source)) {
-        unite(*partner, incidentOf(alert, source));
+        unite(*partner, incidentOf(alert, source, _room));
         return;
     }
     addIncident(alert, source);
@@ -73,7 +77,7 @@ void IncidentMerger::addIncident(Alert& alert, std::size_t source) {
             _nextOfId[std::exchange(sameId->second.last, place)] = place;
     }
     _nextOfId.push_back(0);
-    _incidents.push_back(incidentOf(alert, source));
+    _incidents.push_back(incidentOf(alert, source, _room));
 }
 
 Incident* IncidentMerger::translationPartner(const Alert& alert, std::size_t source) {
@@ -97,7 +101,7 @@ Incident* IncidentMerger::translationPartner(const Alert& alert, std::size_t sou
     return nullptr;
 }
 
-std::vector<Incident> IncidentMerger::take() {
+IncidentMerger::Incidents IncidentMerger::take() {
     mergeSameContent();
     return std::move(_incidents);
 }
@@ -108,7 +112,8 @@ void IncidentMerger::mergeSameContent() {
     for (const Incident& incident : _incidents)
         contents.push_back(contentOf(incident));
     const std::vector<std::uint64_t> numbers = IncidentContent::numbersOf(contents, _feed);
-    SeededNumberMap<std::size_t> firsts; // the first incident of each number
+    // The first incident of each number.
+    SeededNumberMap<std::size_t, std::pmr::polymorphic_allocator> firsts(_room);
     firsts.reserve(_incidents.size());
     for (std::size_t i = 0; i < _incidents.size(); ++i) {
         std::uint64_t muid = numbers[i];

@@ -7,6 +7,7 @@
 
 #include <cstddef>
 #include <deque>
+#include <memory_resource>
 #include <string>
 #include <string_view>
 #include <vector>
@@ -23,12 +24,15 @@ class IncidentMerger {
 public:
     /// @param feed the feed's short name
     /// @param agencyLanguage a BCP-47 tag; empty where the schedule does not say
-    IncidentMerger(std::string feed, std::string_view agencyLanguage);
+    /// @param room where the incidents' lists will lie; it outlives them
+    IncidentMerger(std::string feed, std::string_view agencyLanguage, AlertRoom room = {});
 
     /// Alerts are added in the order of the feed and outlive the incidents, which take their texts.
     void add(Alert& alert, std::size_t source);
+    using Incidents = std::pmr::deque<Incident>;
+
     /// The incidents, in the order in which their first alerts were added. Ends the merger.
-    [[nodiscard]] std::vector<Incident> take();
+    [[nodiscard]] Incidents take();
 
 private:
     void addIncident(Alert& alert, std::size_t source);
@@ -37,17 +41,19 @@ private:
     [[nodiscard]] std::string_view normalised(const AlertText* text);
     void mergeSameContent();
 
+    AlertRoom _room;
     std::string _feed;
     LanguagePreference _preference;
-    std::vector<Incident> _incidents;
+    Incidents _incidents;
     std::deque<std::string> _normalised; // texts that are compared otherwise than published
     std::size_t _source = 0;
     /// The places of the first and the last incident of one identifier.
     struct SameId {
         std::size_t first = 0, last = 0;
     };
-    SeededTextMap<std::string_view, SameId> _byId; // of the current source
-    std::vector<std::size_t> _nextOfId;            // beside the incidents: 0 behind the last
+    // Of the current source.
+    SeededTextMap<std::string_view, SameId, std::pmr::polymorphic_allocator> _byId;
+    std::vector<std::size_t> _nextOfId; // beside the incidents: 0 behind the last
 };
 
 } // namespace orvo

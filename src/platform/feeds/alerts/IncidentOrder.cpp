@@ -14,13 +14,13 @@ double secondsOf(const NSDate* date, double ifMissing) {
 
 auto sortKey(const FeedTransitIncident& incident) {
     constexpr double Infinity = std::numeric_limits<double>::infinity();
-    const FeedTransitIncident::Details& details = incident.details();
-    return std::tuple(-static_cast<std::int32_t>(details.severity),
-                      static_cast<std::int32_t>(details.effect),
-                      details.isPartOfLine,
-                      -secondsOf(incident.fields().startDate.get(), -Infinity),
-                      incident.fields().muid,
-                      -secondsOf(incident.fields().endDate.get(), Infinity));
+    const FeedTransitIncident::Occurrence& occurrence = incident.occurrence();
+    return std::tuple(-static_cast<std::int32_t>(incident.severity()),
+                      static_cast<std::int32_t>(incident.effect()),
+                      occurrence.isPartOfLine,
+                      -secondsOf(occurrence.startDate.get(), -Infinity),
+                      incident.muid(),
+                      -secondsOf(occurrence.endDate.get(), Infinity));
 }
 
 } // namespace

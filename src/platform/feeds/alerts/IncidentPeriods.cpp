@@ -46,7 +46,7 @@ bool isLastYear(std::optional<std::uint64_t> published) {
            *published <= EndOfYear9999 + LongestDay;
 }
 
-const std::vector<AlertPeriod>& publishedPeriods(const Alert& alert) {
+const AlertPeriods& publishedPeriods(const Alert& alert) {
     if (!alert.impactPeriods.empty())
         return alert.impactPeriods;
     return alert.communicationPeriods.empty() ? alert.activePeriods : alert.communicationPeriods;
@@ -67,7 +67,7 @@ std::optional<IncidentPeriod> fromPublished(const AlertPeriod& period) noexcept 
 }
 
 void addOfAlert(const Alert& alert, std::vector<IncidentPeriod>& periods) {
-    const std::vector<AlertPeriod>& published = publishedPeriods(alert);
+    const AlertPeriods& published = publishedPeriods(alert);
     if (published.empty())
         periods.emplace_back();
     for (const AlertPeriod& period : published)
@@ -77,7 +77,7 @@ void addOfAlert(const Alert& alert, std::vector<IncidentPeriod>& periods) {
 
 std::optional<std::int64_t> earliestStart(const Alert& alert) noexcept {
     std::optional<std::int64_t> earliest;
-    const auto consider = [&](const std::vector<AlertPeriod>& periods) {
+    const auto consider = [&](const AlertPeriods& periods) {
         for (const AlertPeriod& period : periods)
             if (const auto start = moment(period.start); start && (!earliest || *start < *earliest))
                 earliest = start;

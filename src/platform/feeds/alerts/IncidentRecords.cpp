@@ -14,10 +14,6 @@ namespace {
 
 constexpr std::size_t MostLookedAt = 16;
 
-std::shared_ptr<NSDate> dateOf(const std::optional<std::int64_t>& seconds) {
-    return seconds ? NSDate::dateWithTimeIntervalSince1970(static_cast<double>(*seconds)) : nullptr;
-}
-
 /// The worst that any of the alerts says.
 IncidentSeverity severityOf(const Incident& incident) {
     auto severity = static_cast<std::int32_t>(IncidentSeverity::Unknown);
@@ -127,24 +123,28 @@ std::optional<std::int64_t> earliestStart(const Incident& incident) {
 
 } // namespace
 
-IncidentRecords::IncidentRecords(const RecordContext& context,
+IncidentRecords::IncidentRecords(RecordContext& context,
                                  const Incident& incident,
                                  const ConcernedLines& lines)
     : _context(context)
-    , _incident(incident) {
-    _details.feed = context.feed;
-    _details.severity = severityOf(incident);
-    _details.effect = static_cast<IncidentEffect>(incident.effect);
-    _details.cause = causeOf(incident);
-    IncidentTexts texts = context.wording.textsOf(incident, lines, _details.cause);
-    _details.spokenTitle = std::move(texts.spokenTitle);
-    _details.link = std::move(texts.link);
-    _details.entitySource = entitySourceOf(context, incident, lines);
-    _fields = sharedFields(std::move(texts));
+    , _incident(incident)
+    , _made(context.room) {
+    _common = std::make_shared<const FeedTransitIncident::Common>(commonOf(lines));
 }
 
-TransitIncidentRecord::Fields IncidentRecords::sharedFields(IncidentTexts texts) const {
-    TransitIncidentRecord::Fields fields;
+FeedTransitIncident::Common IncidentRecords::commonOf(const ConcernedLines& lines) const {
+    FeedTransitIncident::Common common;
+    FeedTransitIncident::Details& details = common.details;
+    details.feed = _context.feed;
+    details.severity = severityOf(_incident);
+    details.effect = static_cast<IncidentEffect>(_incident.effect);
+    details.cause = causeOf(_incident);
+    details.entitySource = entitySourceOf(_context, _incident, lines);
+    IncidentTexts texts = _context.wording.textsOf(_incident, lines, details.cause);
+    details.isSummaryWhole = texts.isSummaryWhole;
+    details.spokenTitle = std::move(texts.spokenTitle);
+    details.link = std::move(texts.link);
+    FeedTransitIncident::Fields& fields = common.fields;
     fields.muid = _incident.muid;
     fields.title = std::move(texts.title);
     fields.summary = std::move(texts.summary);
@@ -153,7 +153,7 @@ TransitIncidentRecord::Fields IncidentRecords::sharedFields(IncidentTexts texts)
     fields.lastUpdated = latestHeaderDate();
     const auto start = earliestStart(_incident);
     fields.creationDate = start ? dateOf(start) : fields.lastUpdated;
-    return fields;
+    return common;
 }
 
 std::shared_ptr<NSDate> IncidentRecords::latestHeaderDate() const {
@@ -180,32 +180,36 @@ std::shared_ptr<FeedTransitIncident> IncidentRecords::made(const ConcernedLines:
     const auto found = std::find_if(_made.rbegin(),
                                     _made.rbegin() + static_cast<std::ptrdiff_t>(looked),
                                     [&](const Made& made) {
-                                        const auto& details = made.record->details();
+                                        const auto& known = made.record->occurrence();
                                         return made.period == period &&
-                                               details.isPartOfLine == line.isPart &&
-                                               details.timeZone.value_or("") == timeZoneOf(line);
+                                               known.isPartOfLine == line.isPart &&
+                                               known.timeZone.value_or("") == timeZoneOf(line);
                                     });
     return found == _made.rbegin() + static_cast<std::ptrdiff_t>(looked) ? nullptr : found->record;
+}
+
+std::shared_ptr<NSDate> IncidentRecords::dateOf(const std::optional<std::int64_t>& seconds) const {
+    return seconds ? _context.dates.date(*seconds) : nullptr;
+}
+
+FeedTransitIncident::Occurrence IncidentRecords::occurrence(const ConcernedLines::Line& line,
+                                                            const IncidentPeriod& period) const {
+    FeedTransitIncident::Occurrence occurrence;
+    occurrence.startDate = dateOf(period.start);
+    occurrence.endDate = dateOf(period.end);
+    occurrence.isBlockingIncident =
+        static_cast<IncidentEffect>(_incident.effect) == IncidentEffect::NoService && !line.isPart;
+    occurrence.isPartOfLine = line.isPart;
+    if (!timeZoneOf(line).empty())
+        occurrence.timeZone = timeZoneOf(line);
+    return occurrence;
 }
 
 std::shared_ptr<FeedTransitIncident> IncidentRecords::record(const ConcernedLines::Line& line,
                                                              const IncidentPeriod& period) {
     if (auto known = made(line, period))
         return known;
-    if (!_made.empty()) {
-        _fields = _made.front().record->fields();
-        _details = _made.front().record->details();
-    }
-    const auto effect = static_cast<IncidentEffect>(_incident.effect);
-    _fields.startDate = dateOf(period.start);
-    _fields.endDate = dateOf(period.end);
-    _fields.isBlockingIncident = effect == IncidentEffect::NoService && !line.isPart;
-    _details.isPartOfLine = line.isPart;
-    _details.timeZone.reset();
-    if (!timeZoneOf(line).empty())
-        _details.timeZone = timeZoneOf(line);
-    auto record =
-        FeedTransitIncident::initWithFields_details(std::move(_fields), std::move(_details));
+    auto record = FeedTransitIncident::initWithCommon_occurrence(_common, occurrence(line, period));
     _made.push_back({period, record});
     return record;
 }

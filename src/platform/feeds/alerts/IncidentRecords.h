@@ -2,6 +2,7 @@
 
 #include "platform/feeds/alerts/ConcernedLines.h"
 #include "platform/feeds/alerts/Incident.h"
+#include "platform/feeds/alerts/IncidentDates.h"
 #include "platform/feeds/alerts/IncidentPeriods.h"
 #include "platform/feeds/alerts/IncidentWording.h"
 #include "platform/foundation/NSDate.h"
@@ -20,15 +21,15 @@ struct RecordContext {
     std::vector<std::shared_ptr<NSDate>> headerDates; ///< of each source: when it was made
     IncidentWording wording;
     std::shared_ptr<const LineTable> table;
+    AlertRoom room; ///< for what is needed while the records are made
+    IncidentDates dates;
 };
 
 /// Makes the records of one incident. What they share is made once.
 class IncidentRecords {
 public:
     /// The context and the incident outlive the object.
-    IncidentRecords(const RecordContext& context,
-                    const Incident& incident,
-                    const ConcernedLines& lines);
+    IncidentRecords(RecordContext& context, const Incident& incident, const ConcernedLines& lines);
 
     /// The incident as it concerns one of its lines, in one period. Lines that it concerns alike
     /// have the same record.
@@ -40,20 +41,21 @@ private:
     [[nodiscard]] std::shared_ptr<FeedTransitIncident> made(const ConcernedLines::Line& line,
                                                             const IncidentPeriod& period) const;
     [[nodiscard]] std::shared_ptr<NSDate> latestHeaderDate() const;
-    [[nodiscard]] TransitIncidentRecord::Fields sharedFields(IncidentTexts texts) const;
+    [[nodiscard]] FeedTransitIncident::Common commonOf(const ConcernedLines& lines) const;
+    [[nodiscard]] std::shared_ptr<NSDate> dateOf(const std::optional<std::int64_t>& seconds) const;
+    [[nodiscard]] FeedTransitIncident::Occurrence occurrence(const ConcernedLines::Line& line,
+                                                             const IncidentPeriod& period) const;
 
-    const RecordContext& _context;
+    RecordContext& _context;
     const Incident& _incident;
-    // Of the record that is made next. They are given to it; another takes the first one's.
-    TransitIncidentRecord::Fields _fields;
-    FeedTransitIncident::Details _details;
+    std::shared_ptr<const FeedTransitIncident::Common> _common;
 
     /// A record and what it was made for.
     struct Made {
         IncidentPeriod period;
         std::shared_ptr<FeedTransitIncident> record;
     };
-    std::vector<Made> _made;
+    std::pmr::vector<Made> _made;
 };
 
 } // namespace orvo

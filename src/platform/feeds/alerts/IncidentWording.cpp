@@ -29,6 +29,19 @@ std::string_view withoutBeginning(std::string_view text, std::string_view beginn
     return rest.substr(std::min(rest.size(), rest.find_first_not_of(".:;!? \n")));
 }
 
+/// What the description tells, whose first paragraph may be all of it.
+void takeDescription(std::string whole, std::string_view header, IncidentTexts& texts) {
+    if (whole.empty())
+        return;
+    std::string room;
+    const std::string_view summary = IncidentWording::summaryOf(whole, header, room);
+    texts.isSummaryWhole = summary == whole;
+    if (!summary.empty() && !texts.isSummaryWhole)
+        texts.summary = TextCleaner::capped(std::string(summary), TextCleaner::LongestText);
+    (texts.isSummaryWhole ? texts.summary : texts.fullDescription) =
+        TextCleaner::capped(std::move(whole), TextCleaner::LongestText);
+}
+
 std::optional<std::string> webAddress(const AlertText* link) {
     if (!link)
         return std::nullopt;
@@ -52,24 +65,24 @@ IncidentTexts IncidentWording::textsOf(const Incident& incident,
     const auto effect = static_cast<IncidentEffect>(incident.effect);
     const auto [header, description] = _preference.bestPair(incident.header, incident.description);
     IncidentTexts texts;
-    const std::string title = header ? TextCleaner::cleanLine(header->text) : std::string();
+    std::string title = header ? TextCleaner::cleanLine(header->text) : std::string();
     const bool isOnlyName = std::any_of(
         lines.lines().begin(), lines.lines().end(), [&](const ConcernedLines::Line& line) {
             return !isLongerThanName(title.size(), line.entry->nameLength) &&
                    isOnlyNameOfLine(title, *line.line);
         });
     const bool isTold = !title.empty() && !isOnlyName;
-    texts.title =
-        isTold ? TextCleaner::capped(title, TextCleaner::LongestTitle) : _words.effect(effect);
-
-    std::string whole = description ? TextCleaner::clean(description->text) : std::string();
-    std::string summary = TextCleaner::capped(summaryOf(whole, title), TextCleaner::LongestText);
-    if (summary.empty())
-        summary = _words.effect_cause(effect, cause);
-    if (summary != texts.title)
-        texts.summary = std::move(summary);
-    if (!whole.empty())
-        texts.fullDescription = TextCleaner::capped(std::move(whole), TextCleaner::LongestText);
+    takeDescription(
+        description ? TextCleaner::clean(description->text) : std::string(), title, texts);
+    texts.title = isTold ? TextCleaner::capped(std::move(title), TextCleaner::LongestTitle)
+                         : _words.effect(effect);
+    if (!texts.summary)
+        texts.summary = _words.effect_cause(effect, cause);
+    if (texts.summary == texts.title) {
+        if (std::exchange(texts.isSummaryWhole, false))
+            texts.fullDescription = texts.summary;
+        texts.summary.reset();
+    }
 
     const AlertText* const spoken =
         isTold ? _preference.like(*header, incident.spokenHeader) : nullptr;
@@ -91,10 +104,13 @@ bool IncidentWording::mayBeOnlyName(const Incident& incident, std::size_t nameLe
            !isLongerThanName(TextCleaner::cleanLine(header->text, room).size(), nameLength);
 }
 
-std::string IncidentWording::summaryOf(std::string_view description, std::string_view header) {
+std::string_view IncidentWording::summaryOf(std::string_view description,
+                                            std::string_view header,
+                                            std::string& room) {
     while (!description.empty()) {
         const std::string_view paragraph = TextCleaner::firstParagraph(description);
-        std::string rest = TextCleaner::onOneLine(withoutBeginning(paragraph, header));
+        const std::string_view rest =
+            TextCleaner::onOneLine(withoutBeginning(paragraph, header), room);
         if (!rest.empty())
             return rest;
         description.remove_prefix(std::min(paragraph.size() + 2, description.size()));

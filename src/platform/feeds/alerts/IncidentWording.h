@@ -16,7 +16,8 @@ namespace orvo {
 struct IncidentTexts {
     std::string title;                          ///< on one line, never blank
     std::optional<std::string> summary;         ///< on one line; nothing when it would repeat
-    std::optional<std::string> fullDescription; ///< nothing when there is none
+    std::optional<std::string> fullDescription; ///< nothing without one, or where the summary is it
+    bool isSummaryWhole = false;                ///< the summary is all of the description
     std::optional<std::string> spokenTitle; ///< nothing when it is as the title, or there is none
     std::optional<std::string> link;        ///< an http or https address
 };
@@ -40,8 +41,10 @@ public:
 
     /// The first paragraph of the description, on one line, without the header where it begins with
     /// it; the next paragraph where that was all. Empty when nothing else is said.
-    [[nodiscard]] static std::string summaryOf(std::string_view description,
-                                               std::string_view header);
+    ///
+    /// A view into the description, or into `room` where it was written anew.
+    [[nodiscard]] static std::string_view
+    summaryOf(std::string_view description, std::string_view header, std::string& room);
 
 private:
     LanguagePreference _preference;

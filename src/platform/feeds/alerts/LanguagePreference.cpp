@@ -71,7 +71,7 @@ LanguagePreference LanguagePreference::forAgency(std::string_view agency) {
     return preference;
 }
 
-const AlertText* LanguagePreference::best(const std::vector<AlertText>& texts) const {
+const AlertText* LanguagePreference::best(std::span<const AlertText> texts) const {
     const AlertText* best = nullptr;
     int bestRank = 0;
     for (const AlertText& text : texts) {
@@ -85,8 +85,8 @@ const AlertText* LanguagePreference::best(const std::vector<AlertText>& texts) c
 }
 
 LanguagePreference::Pair
-LanguagePreference::bestPair(const std::vector<AlertText>& headers,
-                             const std::vector<AlertText>& descriptions) const {
+LanguagePreference::bestPair(std::span<const AlertText> headers,
+                             std::span<const AlertText> descriptions) const {
     Pair best;
     int bestRank = 0;
     for (const AlertText& header : headers) {
@@ -102,7 +102,7 @@ LanguagePreference::bestPair(const std::vector<AlertText>& headers,
 }
 
 const AlertText* LanguagePreference::like(const AlertText& model,
-                                          const std::vector<AlertText>& texts) const {
+                                          std::span<const AlertText> texts) const {
     const Language& wanted = known(model.language);
     const AlertText* sameLanguage = nullptr;
     for (const AlertText& text : texts) {

@@ -4,10 +4,10 @@
 #include "platform/foundation/SeededStringHash.h"
 
 #include <array>
+#include <span>
 #include <string>
 #include <string_view>
 #include <utility>
-#include <vector>
 
 namespace orvo {
 
@@ -35,14 +35,14 @@ public:
     };
 
     /// Nil for an empty list. Of equally good ones the first.
-    [[nodiscard]] const AlertText* best(const std::vector<AlertText>& texts) const;
+    [[nodiscard]] const AlertText* best(std::span<const AlertText> texts) const;
     /// Both in one language wherever there is one that has both, in the order of preference; each
     /// for itself where there is none.
-    [[nodiscard]] Pair bestPair(const std::vector<AlertText>& headers,
-                                const std::vector<AlertText>& descriptions) const;
+    [[nodiscard]] Pair bestPair(std::span<const AlertText> headers,
+                                std::span<const AlertText> descriptions) const;
     /// The text of the same tag as `model`, else of the same language. Nil where there is none.
     [[nodiscard]] const AlertText* like(const AlertText& model,
-                                        const std::vector<AlertText>& texts) const;
+                                        std::span<const AlertText> texts) const;
 
     /// In small letters, with `-` between the parts and without what is no part of a tag.
     [[nodiscard]] static std::string normalisedTag(std::string_view tag);

@@ -174,15 +174,18 @@ std::string cleanLine(std::string_view text) {
 
 std::string_view cleanLine(std::string_view text, std::string& room) {
     text = trimmed(text);
-    return isPlain(text) ? text : room = onOneLine(clean(text));
+    if (isPlain(text))
+        return text;
+    room = clean(text);
+    return onOneLine(room, room);
 }
 
-std::string onOneLine(std::string_view cleanText) {
+std::string_view onOneLine(std::string_view cleanText, std::string& room) {
     if (isPlain(cleanText))
-        return std::string(cleanText);
+        return cleanText;
     std::string line(cleanText);
     std::replace(line.begin(), line.end(), '\n', ' ');
-    return tidied(line);
+    return room = tidied(line);
 }
 
 std::string_view firstParagraph(std::string_view cleanText) noexcept {

@@ -26,8 +26,9 @@ inline constexpr std::size_t LongestPublished = std::size_t{1} << 20U;
 /// it was; else views `room`, which is written.
 [[nodiscard]] std::string_view cleanLine(std::string_view text, std::string& room);
 
-/// A clean text with each run of blanks and line breaks as one blank.
-[[nodiscard]] std::string onOneLine(std::string_view cleanText);
+/// A clean text with each run of blanks and line breaks as one blank. Views `cleanText` or `room`,
+/// as above; the text may lie in `room`.
+[[nodiscard]] std::string_view onOneLine(std::string_view cleanText, std::string& room);
 
 /// The first paragraph of a clean text: up to the first empty line.
 [[nodiscard]] std::string_view firstParagraph(std::string_view cleanText) noexcept;

@@ -24,7 +24,7 @@ AlertSelector agency(std::string_view id) {
 
 /// The lines that alerts with these selectors concern: `R1(S1,S2)#0,1` is a part, `R1#0` the whole;
 /// behind `#` the alerts that name the line.
-std::string concerned(const std::vector<std::vector<AlertSelector>>& alerts) {
+std::string concerned(const std::vector<AlertSelectors>& alerts) {
     const auto index = smallIndex();
     const LineTable table(index);
     AlertStatistics statistics;
@@ -102,7 +102,7 @@ TEST(ConcernedLines, TellWhichAlertsNameThem) {
 }
 
 TEST(ConcernedLines, WhatNamesAllLinesOfAnAgencyIsTakenOnce) {
-    EXPECT_EQ(concerned({std::vector<AlertSelector>(3, agency("A1"))}), "R1#0 R2#0 R3#0 M1#0");
+    EXPECT_EQ(concerned({AlertSelectors(3, agency("A1"))}), "R1#0 R2#0 R3#0 M1#0");
 }
 
 TEST(ConcernedLines, ATripWithoutARouteCostsNoOtherSelectorOfItsStop) {

@@ -38,7 +38,7 @@ AlertMaker withSelector(const Wire& selector) {
     return maker;
 }
 
-std::string routesOf(const std::vector<AlertSelector>& selectors) {
+std::string routesOf(const AlertSelectors& selectors) {
     std::string text;
     for (const AlertSelector& selector : selectors)
         text += (text.empty() ? "" : " ") + std::string(selector.routeId);
@@ -338,7 +338,7 @@ TEST(EntityReader, SelectorsOfNoInterestAreKeptAsTheyCame) {
     const Reading read(maker.entity(), &shapes);
     EXPECT_EQ(routesOf(read.alert().selectors), "R1");
     EXPECT_TRUE(read.alert().hasUnreadSelectors);
-    std::vector<AlertSelector> all;
+    AlertSelectors all;
     EntityReader::readSelectors(read.alert().selectorFields, all);
     EXPECT_EQ(routesOf(all), "R7 R1 R8");
     EXPECT_EQ(read.alert().activePeriods.size(), 1U);
@@ -354,7 +354,7 @@ TEST(EntityReader, OtherFieldsAmongSelectorsOfNoInterestAreRead) {
     const Reading read(maker.entity(), &shapes);
     EXPECT_TRUE(read.alert().hasUnreadSelectors);
     EXPECT_EQ(read.alert().severity, 4);
-    std::vector<AlertSelector> all;
+    AlertSelectors all;
     EntityReader::readSelectors(read.alert().selectorFields, all);
     EXPECT_EQ(routesOf(all), "R1 R6 R7 R8");
 }

@@ -13,8 +13,8 @@ namespace orvo::testing {
 namespace {
 
 Alert alert(std::string_view id,
-            std::vector<AlertText> header,
-            std::vector<AlertText> description = {},
+            AlertTexts header,
+            AlertTexts description = {},
             std::int32_t effect = 4) {
     Alert alert;
     alert.id = id;
@@ -24,7 +24,7 @@ Alert alert(std::string_view id,
     return alert;
 }
 
-std::vector<Incident>
+IncidentMerger::Incidents
 merge(std::deque<Alert>& alerts, std::string_view agency = "en", const std::string& feed = "town") {
     IncidentMerger merger(feed, agency);
     for (Alert& each : alerts)

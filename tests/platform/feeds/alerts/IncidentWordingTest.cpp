@@ -11,10 +11,10 @@ namespace {
 
 /// An incident that concerns the line R1, "1 Harbour".
 struct Example {
-    std::vector<AlertText> header = {{"Trams turn early", "en"}};
-    std::vector<AlertText> description = {{"No trams beyond the bridge.", "en"}};
-    std::vector<AlertText> spokenHeader;
-    std::vector<AlertText> link;
+    AlertTexts header = {{"Trams turn early", "en"}};
+    AlertTexts description = {{"No trams beyond the bridge.", "en"}};
+    AlertTexts spokenHeader;
+    AlertTexts link;
     IncidentCause cause = IncidentCause::UnknownCause;
     std::string person = "en";
 
@@ -39,21 +39,26 @@ struct Example {
     }
 };
 
+std::string summaryOf(std::string_view description, std::string_view header) {
+    std::string room;
+    return std::string(IncidentWording::summaryOf(description, header, room));
+}
+
 } // namespace
 
 TEST(IncidentWording, TheHeaderIsTheTitleAndTheDescriptionTheSummary) {
     const IncidentTexts texts = Example().texts();
     EXPECT_EQ(texts.title, "Trams turn early");
     EXPECT_EQ(texts.summary, "No trams beyond the bridge.");
-    EXPECT_EQ(texts.fullDescription, "No trams beyond the bridge.");
+    EXPECT_TRUE(texts.isSummaryWhole);
+    EXPECT_EQ(texts.fullDescription, std::nullopt);
     EXPECT_EQ(texts.spokenTitle, std::nullopt);
     EXPECT_EQ(texts.link, std::nullopt);
 }
 
 TEST(IncidentWording, ABlankTitleIsTheEffectInWords) {
     Example example;
-    for (const std::vector<AlertText>& header :
-         {std::vector<AlertText>{}, {{"<p> </p>", "en"}}, {{"&nbsp;", "en"}}}) {
+    for (const AlertTexts& header : {AlertTexts{}, {{"<p> </p>", "en"}}, {{"&nbsp;", "en"}}}) {
         example.header = header;
         EXPECT_EQ(example.texts().title, "Detour");
     }
@@ -76,11 +81,23 @@ TEST(IncidentWording, TheSummaryIsTheFirstParagraphOnOneLine) {
     example.description = {{"One\ntwo.\n\nThree.", "en"}};
     EXPECT_EQ(example.texts().summary, "One two.");
     EXPECT_EQ(example.texts().fullDescription, "One\ntwo.\n\nThree.");
+    EXPECT_FALSE(example.texts().isSummaryWhole);
+}
+
+TEST(IncidentWording, ADescriptionThatRepeatsTheTitleIsNoSummary) {
+    Example example;
+    example.header = {};
+    example.description = {{"Detour", "en"}}; // what the effect is called
+    const IncidentTexts texts = example.texts();
+    EXPECT_EQ(texts.title, "Detour");
+    EXPECT_EQ(texts.summary, std::nullopt);
+    EXPECT_FALSE(texts.isSummaryWhole);
+    EXPECT_EQ(texts.fullDescription, "Detour");
 }
 
 TEST(IncidentWording, ARepeatedHeaderIsLeftOutOfTheSummary) {
     const auto summary = [](const char* description) {
-        return IncidentWording::summaryOf(description, "Line 5 delayed");
+        return summaryOf(description, "Line 5 delayed");
     };
     EXPECT_EQ(summary("Line 5 delayed\n\nA fire."), "A fire.");
     EXPECT_EQ(summary("Line 5 delayed\nA fire."), "A fire.");
@@ -93,10 +110,10 @@ TEST(IncidentWording, ARepeatedHeaderIsLeftOutOfTheSummary) {
 }
 
 TEST(IncidentWording, ASentenceThatOnlyBeginsLikeTheHeaderStaysWhole) {
-    EXPECT_EQ(IncidentWording::summaryOf("Delays on line 5.", "Delays"), "Delays on line 5.");
-    EXPECT_EQ(IncidentWording::summaryOf("Delayed.", "Delay"), "Delayed.");
-    EXPECT_EQ(IncidentWording::summaryOf("A fire.", ""), "A fire.");
-    EXPECT_EQ(IncidentWording::summaryOf("", "Delays"), "");
+    EXPECT_EQ(summaryOf("Delays on line 5.", "Delays"), "Delays on line 5.");
+    EXPECT_EQ(summaryOf("Delayed.", "Delay"), "Delayed.");
+    EXPECT_EQ(summaryOf("A fire.", ""), "A fire.");
+    EXPECT_EQ(summaryOf("", "Delays"), "");
 }
 
 TEST(IncidentWording, WithoutADescriptionTheSummaryIsCauseAndEffectInWords) {
@@ -143,6 +160,10 @@ TEST(IncidentWording, TextsAreCapped) {
     example.description = {{text, "en"}};
     EXPECT_EQ(example.texts().title.size(), TextCleaner::LongestTitle);
     EXPECT_EQ(example.texts().summary->size(), TextCleaner::LongestText);
+    EXPECT_TRUE(example.texts().isSummaryWhole);
+    const std::string paragraphs = "One.\n\n" + text;
+    example.description = {{paragraphs, "en"}};
+    EXPECT_EQ(example.texts().summary, "One.");
     EXPECT_EQ(example.texts().fullDescription->size(), TextCleaner::LongestText);
 }
 

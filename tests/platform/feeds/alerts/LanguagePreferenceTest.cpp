@@ -6,7 +6,7 @@ namespace orvo::testing {
 
 namespace {
 
-using Texts = std::vector<AlertText>;
+using Texts = AlertTexts;
 
 /// Texts that say what their tags are.
 Texts tagged(const std::vector<std::string_view>& tags) {

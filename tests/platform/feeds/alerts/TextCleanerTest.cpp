@@ -95,7 +95,8 @@ TEST(TextCleaner, IsTheSameWhenDoneAgain) {
 }
 
 TEST(TextCleaner, OnOneLineLeavesNoLineBreaks) {
-    EXPECT_EQ(TextCleaner::onOneLine("a\n\nb\nc d"), "a b c d");
+    std::string room;
+    EXPECT_EQ(TextCleaner::onOneLine("a\n\nb\nc d", room), "a b c d");
 }
 
 TEST(TextCleaner, TheFirstParagraphEndsAtTheFirstEmptyLine) {
