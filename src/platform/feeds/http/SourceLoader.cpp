@@ -20,7 +20,7 @@ LoadOptions LoadOptions::forSchedule() {
 class SourceLoader::Engine {
 public:
     Engine(const std::filesystem::path& cacheFolder, std::shared_ptr<HttpTransport> transport)
-        : ground(std::make_shared<_SourceGround>(cacheFolder / "bodies", std::move(transport))) {}
+        : ground(std::make_shared<_SourceGround>(cacheFolder, std::move(transport))) {}
 
     const std::shared_ptr<_SourceGround> ground;
     std::mutex mutex;

@@ -172,16 +172,21 @@ void _SourceLoad::fetch(bool mayBeConditional) {
 
 void _SourceLoad::fetched(HttpFetchResult result) {
     if (result.retryDelay)
-        _ground->pauses.note(_key,
-                             *result.retryDelay,
-                             result.status,
-                             Environment::monotonicClock().get()->seconds());
+        notePause(*result.retryDelay, result.status);
     if (result.error)
         fail(std::move(result.error));
     else if (result.isNotModified)
         gotValidated(result);
     else
         gotWhole(std::move(result));
+}
+
+void _SourceLoad::notePause(double seconds, int status) {
+    const double now = Environment::monotonicClock().get()->seconds();
+    if (const auto error = _ground->pauses.note(_key, seconds, status, now))
+        Log::findOrCreate("Feeds")->error("that %@ wants a pause is not kept on the disk: %@",
+                                          _request.displayLocation(),
+                                          error->localizedDescription());
 }
 
 void _SourceLoad::gotWhole(HttpFetchResult result) {

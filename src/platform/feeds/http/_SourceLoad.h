@@ -13,8 +13,10 @@ namespace orvo {
 /// What the loads of one loader share. Any thread.
 class _SourceGround {
 public:
-    _SourceGround(std::filesystem::path cacheFolder, std::shared_ptr<HttpTransport> transport)
-        : store(std::move(cacheFolder))
+    _SourceGround(const std::filesystem::path& cacheFolder,
+                  std::shared_ptr<HttpTransport> transport)
+        : store(cacheFolder / "bodies")
+        , pauses(cacheFolder / "pauses")
         , _transport(std::move(transport)) {}
 
     BodyStore store;
@@ -59,6 +61,7 @@ private:
     void readFile(const std::filesystem::path& path);
     void fetch(bool mayBeConditional);
     void fetched(HttpFetchResult result);
+    void notePause(double seconds, int status);
     void gotWhole(HttpFetchResult result);
     void gotValidated(const HttpFetchResult& result);
 

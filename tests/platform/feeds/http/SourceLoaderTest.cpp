@@ -271,6 +271,15 @@ TEST_F(SourceLoaderTest, AfterThePauseTheServerIsAskedAgain) {
     EXPECT_EQ(textOf(load(*loader, request)), "body");
 }
 
+TEST_F(SourceLoaderTest, AProgramThatIsStartedInThePauseAsksNobody) {
+    network->answer(503, {{"retry-after", "3600"}});
+    (void)load(*loader, request);
+    const auto asked = network->asked().size();
+    loader = SourceLoader::make(folder.path() / "cache", network);
+    EXPECT_EQ(codeOf(load(*loader, request)), SourceErrorCode::RetryLater);
+    EXPECT_EQ(network->asked().size(), asked);
+}
+
 TEST_F(SourceLoaderTest, ThePauseIsThatRequestsOwn) {
     network->answer(503, {{"retry-after", "120"}});
     (void)load(*loader, request);
