@@ -249,6 +249,16 @@ TEST_F(FeedsCommandsTest, UnknownFeedsAreNamed) {
         EXPECT_THAT(refused({"feeds", command, "nowhere"}), HasSubstr("there is no feed nowhere"));
 }
 
+TEST_F(FeedsCommandsTest, AMisspeltFeedIsAnsweredWithTheOneThatIsNear) {
+    addCity();
+    for (const char* command : {"update", "check", "remove"}) {
+        EXPECT_THAT(refused({"feeds", command, "ctiy"}),
+                    HasSubstr("there is no feed ctiy; did you mean city?"));
+        EXPECT_THAT(refused({"feeds", command, "village"}),
+                    HasSubstr("there is no feed village; see: orvo feeds list"));
+    }
+}
+
 TEST_F(FeedsCommandsTest, ADamagedRegistryIsNamedWithTheReasonAndTheCure) {
     addCity();
     answered({"favorites", "add", "M1"});
