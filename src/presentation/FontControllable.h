@@ -22,7 +22,7 @@ public:
 
     /// The object that lives on screen; what stands for another object names that one.
     [[nodiscard]] virtual std::shared_ptr<NSObject> _controlled() {
-        return std::shared_ptr<NSObject>(shared_from_this(), this);
+        return {shared_from_this(), this};
     }
     /// An object as one whose font can be set: itself, or what stands for a label. Nil for others.
     [[nodiscard]] static std::shared_ptr<FontControllable>

@@ -54,7 +54,9 @@ public:
     [[nodiscard]] std::uint64_t hash() const override;
     [[nodiscard]] std::string description() const override;
 
-protected:
+private:
+    friend class NSMutableAttributedString;
+
     std::string _string;
     std::vector<Run> _runs;
 };

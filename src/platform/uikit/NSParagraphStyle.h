@@ -39,7 +39,9 @@ public:
     [[nodiscard]] std::uint64_t hash() const override;
     [[nodiscard]] std::string description() const override;
 
-protected:
+private:
+    friend class NSMutableParagraphStyle;
+
     double _lineSpacing = 0;
     NSTextAlignment _alignment = NSTextAlignment::Natural;
     NSLineBreakMode _lineBreakMode = NSLineBreakMode::ByWordWrapping;

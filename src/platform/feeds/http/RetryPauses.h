@@ -49,13 +49,14 @@ private:
     using FileTime = std::filesystem::file_time_type;
 
     struct End {
-        double at;
-        int status;
+        double at = 0; // monotonic
+        int status = 0;
         std::optional<FileTime> written; ///< of its file
     };
 
     [[nodiscard]] std::filesystem::path path(const std::string& key) const;
-    std::shared_ptr<NSError> write(const std::string& key, double seconds, int status) const;
+    [[nodiscard]] std::shared_ptr<NSError>
+    write(const std::string& key, double seconds, int status) const;
     [[nodiscard]] std::optional<FileTime> written(const std::string& key) const;
     [[nodiscard]] std::optional<Pause> pauseOnDisk(const std::string& key, FileTime written) const;
 

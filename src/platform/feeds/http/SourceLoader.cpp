@@ -79,7 +79,7 @@ std::shared_ptr<SourceLoad> SourceLoader::load(const SourceRequest& request,
 }
 
 SourceBody SourceLoader::lastGoodBody(const SourceRequest& request) const {
-    return _lastGoodBody(_engine->ground->store, request.key());
+    return _lastGoodBody(_engine->ground->store(), request.key());
 }
 
 } // namespace orvo

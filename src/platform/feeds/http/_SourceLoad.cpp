@@ -99,7 +99,7 @@ void _SourceLoad::begin() {
         return;
     }
     const auto pause =
-        _ground->pauses.pending(_key, Environment::monotonicClock().get()->seconds());
+        _ground->pauses().pending(_key, Environment::monotonicClock().get()->seconds());
     if (pause)
         fail(sourceError(SourceErrorCode::RetryLater,
                          fmt::format("{}: the server asked to be left alone for {:.0f} seconds "
@@ -147,7 +147,7 @@ bool _SourceLoad::isConditional(const BodyRecord& record) const {
 }
 
 void _SourceLoad::fetch(bool mayBeConditional) {
-    _known = _ground->store.record(_key);
+    _known = _ground->store().record(_key);
     if (_known && !(mayBeConditional && isConditional(*_known)))
         _known.reset();
     HttpFetch::Validators validators;
@@ -183,7 +183,7 @@ void _SourceLoad::fetched(HttpFetchResult result) {
 
 void _SourceLoad::notePause(double seconds, int status) {
     const double now = Environment::monotonicClock().get()->seconds();
-    if (const auto error = _ground->pauses.note(_key, seconds, status, now))
+    if (const auto error = _ground->pauses().note(_key, seconds, status, now))
         Log::findOrCreate("Feeds")->error("that %@ wants a pause is not kept on the disk: %@",
                                           _request.displayLocation(),
                                           error->localizedDescription());
@@ -209,7 +209,7 @@ void _SourceLoad::gotWhole(HttpFetchResult result) {
     body.outcome = SourceBody::Outcome::Whole;
     body.bytes = result.body;
     body.fetchedAt = body.receivedAt = result.at;
-    if (const auto error = _ground->store.save(_key, std::move(record), std::move(result.body)))
+    if (const auto error = _ground->store().save(_key, std::move(record), std::move(result.body)))
         Log::findOrCreate("Feeds")->error("%@ is not kept on the disk: %@",
                                           _request.displayLocation(),
                                           error->localizedDescription());
@@ -218,7 +218,7 @@ void _SourceLoad::gotWhole(HttpFetchResult result) {
 
 void _SourceLoad::gotValidated(const HttpFetchResult& result) {
     SourceBody body;
-    body.bytes = _ground->store.body(_key, *_known);
+    body.bytes = _ground->store().body(_key, *_known);
     if (!body.bytes) {
         fetch(false); // what was validated is damaged: whole, then
         return;
@@ -228,7 +228,7 @@ void _SourceLoad::gotValidated(const HttpFetchResult& result) {
     ++record.validations;
     if (!result.entityTag.empty())
         record.entityTag = result.entityTag;
-    if (const auto error = _ground->store.update(_key, record))
+    if (const auto error = _ground->store().update(_key, record))
         Log::findOrCreate("Feeds")->error("%@ is not noted as validated: %@",
                                           _request.displayLocation(),
                                           error->localizedDescription());
@@ -272,7 +272,7 @@ void _SourceLoad::cancel() {
 }
 
 void _SourceLoad::fail(std::shared_ptr<NSError> error) {
-    auto body = _lastGoodBody(_ground->store, _key);
+    auto body = _lastGoodBody(_ground->store(), _key);
     body.error = std::move(error);
     complete(body);
 }

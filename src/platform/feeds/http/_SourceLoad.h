@@ -15,18 +15,20 @@ class _SourceGround {
 public:
     _SourceGround(const std::filesystem::path& cacheFolder,
                   std::shared_ptr<HttpTransport> transport)
-        : store(cacheFolder / "bodies")
-        , pauses(cacheFolder / "pauses")
+        : _store(cacheFolder / "bodies")
+        , _pauses(cacheFolder / "pauses")
         , _transport(std::move(transport)) {}
 
-    BodyStore store;
-    RetryPauses pauses;
+    [[nodiscard]] BodyStore& store() noexcept { return _store; }
+    [[nodiscard]] RetryPauses& pauses() noexcept { return _pauses; }
 
     /// Expired once the loader has gone.
     [[nodiscard]] std::weak_ptr<HttpTransport> transport();
     void dropTransport();
 
 private:
+    BodyStore _store;
+    RetryPauses _pauses;
     std::mutex _mutex;
     std::shared_ptr<HttpTransport> _transport;
 };
