@@ -11,7 +11,7 @@ FeedLookup::Answer of(const std::vector<FeedConfiguration>& feeds, CommandContex
     auto schedules = context.schedules(answer.error);
     if (!schedules)
         return answer;
-    auto ground = FeedLookup::profileGround();
+    auto ground = FeedLookup::profileGround(true);
     ground.feeds = [feeds](std::shared_ptr<NSError>*) {
         return feeds;
     };

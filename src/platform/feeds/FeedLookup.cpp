@@ -18,7 +18,7 @@ std::shared_ptr<NSError> problemOfAlerts(const NSData& bytes) {
 
 } // namespace
 
-FeedLookup::Ground FeedLookup::profileGround() {
+FeedLookup::Ground FeedLookup::profileGround(bool insists) {
     Ground ground;
     ground.feeds = [](std::shared_ptr<NSError>* error) {
         return FeedRegistry::open()->feeds(error);
@@ -26,11 +26,13 @@ FeedLookup::Ground FeedLookup::profileGround() {
     ground.schedules = [](std::shared_ptr<NSError>* error) {
         return ScheduleStore::open(ScheduleStore::defaultPath(), error);
     };
-    ground.load = [](const SourceRequest& request, std::function<void(SourceBody)> completion) {
+    ground.load = [insists](const SourceRequest& request,
+                            std::function<void(SourceBody)> completion) {
         // An error page that was sent as if all were well must not take the place of the last good
         // body.
         LoadOptions options;
         options.check = problemOfAlerts;
+        options.inPause = insists;
         sharedSourceLoader()->load(request, options, std::move(completion));
     };
     ground.lastKnownLine = [](std::uint64_t) {

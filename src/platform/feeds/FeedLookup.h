@@ -58,7 +58,10 @@ public:
     [[nodiscard]] static std::shared_ptr<FeedLookup> make(Ground ground);
     /// Feeds, schedules, sources and preferences of the profile in use; nothing for lines that no
     /// schedule ever had.
-    [[nodiscard]] static Ground profileGround();
+    ///
+    /// @param insists whether servers are asked also in a pause that they asked for, since a person
+    /// wants to know
+    [[nodiscard]] static Ground profileGround(bool insists = false);
 
     explicit FeedLookup(Ground ground);
     FeedLookup(const FeedLookup&) = delete;

@@ -83,7 +83,7 @@ public:
         std::shared_ptr<const AffectedEntitySource> entitySource;
     };
 
-    /// What objects of one incident share. Of what an occurrence has as well, only that counts.
+    /// What objects of one incident share. What an occurrence has as well does not count here.
     struct Common {
         Fields fields;
         Details details;
@@ -100,10 +100,12 @@ public:
 
     [[nodiscard]] static std::shared_ptr<FeedTransitIncident>
     initWithFields_details(Fields fields, Details details);
+    /// `common` is not nil.
     [[nodiscard]] static std::shared_ptr<FeedTransitIncident>
     initWithCommon_occurrence(std::shared_ptr<const Common> common, Occurrence occurrence);
 
     [[nodiscard]] Details details() const;
+    [[nodiscard]] const std::shared_ptr<const Common>& common() const noexcept { return _common; }
     [[nodiscard]] const Occurrence& occurrence() const noexcept { return _occurrence; }
     [[nodiscard]] IncidentSeverity severity() const noexcept { return _common->details.severity; }
     [[nodiscard]] IncidentEffect effect() const noexcept { return _common->details.effect; }

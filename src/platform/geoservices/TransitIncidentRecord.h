@@ -2,8 +2,6 @@
 
 #include "platform/geoservices/TransitIncident.h"
 
-#include <utility>
-
 namespace orvo {
 
 /// An incident as a plain immutable value.
@@ -58,9 +56,6 @@ public:
     [[nodiscard]] std::shared_ptr<NSArray> affectedEntities() const override {
         return _fields.affectedEntities;
     }
-
-protected:
-    void _initWithFields(Fields fields) { _fields = std::move(fields); }
 
 private:
     Fields _fields;

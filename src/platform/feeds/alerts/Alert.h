@@ -51,6 +51,22 @@ struct Alert {
         , description(room)
         , spokenHeader(room)
         , link(room) {}
+    /// The same alert in another room, in which it takes no more than it needs.
+    Alert(const Alert& other, AlertRoom room)
+        : id(other.id)
+        , activePeriods(other.activePeriods, room)
+        , communicationPeriods(other.communicationPeriods, room)
+        , impactPeriods(other.impactPeriods, room)
+        , selectors(other.selectors, room)
+        , hasUnreadSelectors(other.hasUnreadSelectors)
+        , selectorFields(other.selectorFields)
+        , cause(other.cause)
+        , effect(other.effect)
+        , severity(other.severity)
+        , header(other.header, room)
+        , description(other.description, room)
+        , spokenHeader(other.spokenHeader, room)
+        , link(other.link, room) {}
 
     std::string_view id; ///< the entity's; empty when it has none that can be read
     AlertPeriods activePeriods;

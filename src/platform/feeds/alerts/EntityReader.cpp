@@ -92,6 +92,7 @@ bool isEmpty(const AlertSelector& selector) {
 AlertReading EntityReader::read(std::string_view entity) {
     _statistics.add(AlertCount::Entities);
     AlertReading reading;
+    _room.release();
     _selectors.clear();
     _selectorFields = {};
     _mayPassOver = _passedOver != nullptr;
@@ -116,7 +117,7 @@ AlertReading EntityReader::read(std::string_view entity) {
             if (reading.alert)
                 readPassedOver(*reading.alert);
             else
-                reading.alert.emplace(_room);
+                reading.alert.emplace(&_room);
             if (isBytes(cursor)) {
                 readAlert(cursor.bytes(), reading);
             } else {
@@ -228,12 +229,8 @@ void EntityReader::readPeriod(const WireCursor& field, AlertPeriods& periods) {
     if (periods.empty())
         periods.reserve(UsualPeriods);
     AlertPeriod period;
-    // One that cannot be read leaves open when the alert holds; dropped, it would end it, or bring
-    // an older one back.
-    if (!isBytes(field) || !takeOne()) {
-        periods.emplace_back();
-        return _statistics.add(AlertCount::UnreadablePeriods);
-    }
+    if (!isBytes(field) || !takeOne())
+        return addUnreadPeriod(periods);
     WireCursor cursor(field.bytes());
     while (cursor.next()) {
         if (cursor.key() == WireCursor::number(1))
@@ -243,11 +240,17 @@ void EntityReader::readPeriod(const WireCursor& field, AlertPeriods& periods) {
         else if (cursor.field() <= 2)
             _statistics.add(AlertCount::UnreadablePeriods);
     }
-    if (cursor.failed()) {
-        periods.emplace_back();
-        return _statistics.add(AlertCount::UnreadablePeriods);
-    }
+    if (cursor.failed())
+        return addUnreadPeriod(periods);
     periods.push_back(period);
+}
+
+/// One that cannot be read leaves open when the alert holds; dropped, it would end it, or bring an
+/// older one back. Many in a row say no more than one.
+void EntityReader::addUnreadPeriod(AlertPeriods& periods) {
+    _statistics.add(AlertCount::UnreadablePeriods);
+    if (periods.empty() || periods.back().start || periods.back().end)
+        periods.emplace_back();
 }
 
 bool EntityReader::readSelector(std::string_view bytes, AlertSelector& selector) {

@@ -3,7 +3,9 @@
 #include "platform/feeds/alerts/Alert.h"
 #include "platform/feeds/alerts/AlertStatistics.h"
 
+#include <array>
 #include <cstddef>
+#include <memory_resource>
 #include <optional>
 #include <string_view>
 
@@ -29,16 +31,15 @@ public:
     /// @param passedOver selectors that need not be read: those that fit these shapes, and name
     /// none of their wanted routes. Nil to read all.
     ///
-    /// @param room where the alerts' lists will lie
-    ///
-    /// Statistics, shapes and room outlive the reader.
-    explicit EntityReader(AlertStatistics& statistics,
-                          const SelectorShapes* passedOver = nullptr,
-                          AlertRoom room = {})
+    /// Statistics and shapes outlive the reader.
+    explicit EntityReader(AlertStatistics& statistics, const SelectorShapes* passedOver = nullptr)
         : _statistics(statistics)
-        , _passedOver(passedOver)
-        , _room(room) {}
+        , _passedOver(passedOver) {}
+    EntityReader(const EntityReader&) = delete;
+    EntityReader& operator=(const EntityReader&) = delete;
+    ~EntityReader() = default;
 
+    /// The alert is valid until the next is read: who keeps it, copies it.
     [[nodiscard]] AlertReading read(std::string_view entity);
 
     /// Reads one informed_entity into an empty selector. False when anything of it could not be
@@ -60,6 +61,7 @@ private:
     void addSelectorFields(const char* begin, const char* end);
     void readAlertField(const WireCursor& field, AlertReading& reading);
     void readPeriod(const WireCursor& field, AlertPeriods& periods);
+    void addUnreadPeriod(AlertPeriods& periods);
     void takeSelector(const WireCursor& field, AlertReading& reading);
     void readNumber(const WireCursor& field,
                     bool (*take)(std::uint64_t, std::int32_t&) noexcept,
@@ -70,7 +72,9 @@ private:
 
     AlertStatistics& _statistics;
     const SelectorShapes* _passedOver;
-    AlertRoom _room;
+    // Large enough for the lists of most alerts.
+    std::array<std::byte, 16384> _firstRoom;
+    std::pmr::monotonic_buffer_resource _room{_firstRoom.data(), _firstRoom.size()};
     // Of the entity being read.
     AlertSelectors _selectors;
     std::string_view _selectorFields;

@@ -97,8 +97,7 @@ private:
             if (!_proofs[source].message)
                 continue;
             EntityReader reader(_result.sources[source].statistics,
-                                _selection ? &_selection->shapes() : nullptr,
-                                &_room);
+                                _selection ? &_selection->shapes() : nullptr);
             for (const std::string_view entity : _proofs[source].message->entities)
                 if (!_selection || _selection->isChosen(place++))
                     mergeAlert(reader.read(entity), source, merger);
@@ -106,7 +105,7 @@ private:
         return merger.take();
     }
 
-    void mergeAlert(AlertReading reading, std::size_t source, IncidentMerger& merger) {
+    void mergeAlert(const AlertReading& reading, std::size_t source, IncidentMerger& merger) {
         _hasLostSelectors = _hasLostSelectors || reading.mayConcernAnyLine;
         if (!reading.alert)
             return;
@@ -114,7 +113,7 @@ private:
             reasonAgainstIncident(reading.alert->effect, reading.alert->severity, _query.stepFree);
         if (against)
             return _result.sources[source].statistics.add(*against);
-        _alerts.push_back(std::move(*reading.alert));
+        _alerts.emplace_back(*reading.alert, &_room);
         merger.add(_alerts.back(), source);
     }
 
@@ -124,19 +123,19 @@ private:
                               {},
                               IncidentWording(_query.language, _index.language()),
                               _table,
-                              &_room,
                               {}};
         for (const SourceProof& proof : _proofs)
             context.headerDates.push_back(NSDate::dateWithTimeIntervalSince1970(proof.headerTime));
         SelectorResolver resolver(*_table, _result.statistics);
         ConcernedLines lines(resolver);
+        IncidentRecords records(context);
         for (const Incident& incident : incidents) {
             // Whether a title is only a name can be told when all lines are known.
             if (_selection && !context.wording.mayBeOnlyName(incident, _table->longestName()))
                 lines.find(incident);
             else
                 lines.findAll(incident);
-            buildIncident(context, incident, lines);
+            buildIncident(incident, lines, records);
         }
         _hasLostStops = resolver.hasLostStops();
         _hasLostSelectors = _hasLostSelectors || lines.lostSelectors() > 0;
@@ -144,12 +143,12 @@ private:
     }
 
     void
-    buildIncident(RecordContext& context, const Incident& incident, const ConcernedLines& lines) {
+    buildIncident(const Incident& incident, const ConcernedLines& lines, IncidentRecords& records) {
         _result.statistics.add(AlertCount::Incidents);
         _result.statistics.add(AlertCount::RepeatedAlerts, incident.members.size() - 1);
         if (lines.lines().empty() && lines.areAll())
             return _result.statistics.add(AlertCount::AlertsOfNoLine, incident.members.size());
-        std::optional<IncidentRecords> records;
+        records.begin(incident, lines);
         std::span<const std::size_t> members; // never none for a line
         for (const ConcernedLines::Line& line : lines.lines()) {
             const std::size_t position = _askedAt[line.place];
@@ -160,13 +159,10 @@ private:
                 members = lines.membersOf(line);
                 findPeriods(incident, members);
             }
-            for (const IncidentPeriod& period : _periods) {
-                if (!records)
-                    records.emplace(context, incident, lines);
-                _result.lines[position].incidents.push_back(records->record(line, period));
-            }
+            for (const IncidentPeriod& period : _periods)
+                _result.lines[position].incidents.push_back(records.record(line, period));
         }
-        if (!records && isOutOfTime(incident))
+        if (records.count() == 0 && isOutOfTime(incident))
             _result.statistics.add(AlertCount::AlertsOutOfTime, incident.members.size());
     }
 

@@ -112,8 +112,9 @@ void IncidentMerger::mergeSameContent() {
     for (const Incident& incident : _incidents)
         contents.push_back(contentOf(incident));
     const std::vector<std::uint64_t> numbers = IncidentContent::numbersOf(contents, _feed);
+    std::pmr::monotonic_buffer_resource passing;
     // The first incident of each number.
-    SeededNumberMap<std::size_t, std::pmr::polymorphic_allocator> firsts(_room);
+    SeededNumberMap<std::size_t, std::pmr::polymorphic_allocator> firsts(&passing);
     firsts.reserve(_incidents.size());
     for (std::size_t i = 0; i < _incidents.size(); ++i) {
         std::uint64_t muid = numbers[i];

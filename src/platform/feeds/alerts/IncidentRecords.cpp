@@ -123,35 +123,33 @@ std::optional<std::int64_t> earliestStart(const Incident& incident) {
 
 } // namespace
 
-IncidentRecords::IncidentRecords(RecordContext& context,
-                                 const Incident& incident,
-                                 const ConcernedLines& lines)
-    : _context(context)
-    , _incident(incident)
-    , _made(context.room) {
-    _common = std::make_shared<const FeedTransitIncident::Common>(commonOf(lines));
+void IncidentRecords::begin(const Incident& incident, const ConcernedLines& lines) {
+    _incident = &incident;
+    _lines = &lines;
+    _common.reset();
+    _made.clear();
 }
 
-FeedTransitIncident::Common IncidentRecords::commonOf(const ConcernedLines& lines) const {
+FeedTransitIncident::Common IncidentRecords::makeCommon() const {
     FeedTransitIncident::Common common;
     FeedTransitIncident::Details& details = common.details;
     details.feed = _context.feed;
-    details.severity = severityOf(_incident);
-    details.effect = static_cast<IncidentEffect>(_incident.effect);
-    details.cause = causeOf(_incident);
-    details.entitySource = entitySourceOf(_context, _incident, lines);
-    IncidentTexts texts = _context.wording.textsOf(_incident, lines, details.cause);
+    details.severity = severityOf(*_incident);
+    details.effect = static_cast<IncidentEffect>(_incident->effect);
+    details.cause = causeOf(*_incident);
+    details.entitySource = entitySourceOf(_context, *_incident, *_lines);
+    IncidentTexts texts = _context.wording.textsOf(*_incident, *_lines, details.cause);
     details.isSummaryWhole = texts.isSummaryWhole;
     details.spokenTitle = std::move(texts.spokenTitle);
     details.link = std::move(texts.link);
     FeedTransitIncident::Fields& fields = common.fields;
-    fields.muid = _incident.muid;
+    fields.muid = _incident->muid;
     fields.title = std::move(texts.title);
     fields.summary = std::move(texts.summary);
     fields.fullDescription = std::move(texts.fullDescription);
-    fields.iconType = _incident.effect;
+    fields.iconType = _incident->effect;
     fields.lastUpdated = latestHeaderDate();
-    const auto start = earliestStart(_incident);
+    const auto start = earliestStart(*_incident);
     fields.creationDate = start ? dateOf(start) : fields.lastUpdated;
     return common;
 }
@@ -160,8 +158,8 @@ std::shared_ptr<NSDate> IncidentRecords::latestHeaderDate() const {
     const auto dateOfMember = [&](const IncidentMember& member) {
         return _context.headerDates[member.source];
     };
-    std::shared_ptr<NSDate> latest = dateOfMember(_incident.members.front());
-    for (const IncidentMember& member : _incident.members)
+    std::shared_ptr<NSDate> latest = dateOfMember(_incident->members.front());
+    for (const IncidentMember& member : _incident->members)
         if (const auto date = dateOfMember(member);
             date->timeIntervalSinceReferenceDate() > latest->timeIntervalSinceReferenceDate())
             latest = date;
@@ -198,7 +196,7 @@ FeedTransitIncident::Occurrence IncidentRecords::occurrence(const ConcernedLines
     occurrence.startDate = dateOf(period.start);
     occurrence.endDate = dateOf(period.end);
     occurrence.isBlockingIncident =
-        static_cast<IncidentEffect>(_incident.effect) == IncidentEffect::NoService && !line.isPart;
+        static_cast<IncidentEffect>(_incident->effect) == IncidentEffect::NoService && !line.isPart;
     occurrence.isPartOfLine = line.isPart;
     if (!timeZoneOf(line).empty())
         occurrence.timeZone = timeZoneOf(line);
@@ -209,6 +207,8 @@ std::shared_ptr<FeedTransitIncident> IncidentRecords::record(const ConcernedLine
                                                              const IncidentPeriod& period) {
     if (auto known = made(line, period))
         return known;
+    if (!_common)
+        _common = std::make_shared<const FeedTransitIncident::Common>(makeCommon());
     auto record = FeedTransitIncident::initWithCommon_occurrence(_common, occurrence(line, period));
     _made.push_back({period, record});
     return record;

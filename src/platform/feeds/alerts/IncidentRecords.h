@@ -21,15 +21,21 @@ struct RecordContext {
     std::vector<std::shared_ptr<NSDate>> headerDates; ///< of each source: when it was made
     IncidentWording wording;
     std::shared_ptr<const LineTable> table;
-    AlertRoom room; ///< for what is needed while the records are made
     IncidentDates dates;
 };
 
-/// Makes the records of one incident. What they share is made once.
+/// Makes the records of incidents, one incident after the other. What the records of one share is
+/// made once, with the first of them.
 class IncidentRecords {
 public:
-    /// The context and the incident outlive the object.
-    IncidentRecords(RecordContext& context, const Incident& incident, const ConcernedLines& lines);
+    /// The context outlives the object.
+    explicit IncidentRecords(RecordContext& context)
+        : _context(context) {}
+
+    /// Incident and lines outlive the making of its records.
+    void begin(const Incident& incident, const ConcernedLines& lines);
+    /// How many different records of the incident were made.
+    [[nodiscard]] std::size_t count() const noexcept { return _made.size(); }
 
     /// The incident as it concerns one of its lines, in one period. Lines that it concerns alike
     /// have the same record.
@@ -41,13 +47,14 @@ private:
     [[nodiscard]] std::shared_ptr<FeedTransitIncident> made(const ConcernedLines::Line& line,
                                                             const IncidentPeriod& period) const;
     [[nodiscard]] std::shared_ptr<NSDate> latestHeaderDate() const;
-    [[nodiscard]] FeedTransitIncident::Common commonOf(const ConcernedLines& lines) const;
+    [[nodiscard]] FeedTransitIncident::Common makeCommon() const;
     [[nodiscard]] std::shared_ptr<NSDate> dateOf(const std::optional<std::int64_t>& seconds) const;
     [[nodiscard]] FeedTransitIncident::Occurrence occurrence(const ConcernedLines::Line& line,
                                                              const IncidentPeriod& period) const;
 
     RecordContext& _context;
-    const Incident& _incident;
+    const Incident* _incident = nullptr;
+    const ConcernedLines* _lines = nullptr;
     std::shared_ptr<const FeedTransitIncident::Common> _common;
 
     /// A record and what it was made for.
@@ -55,7 +62,7 @@ private:
         IncidentPeriod period;
         std::shared_ptr<FeedTransitIncident> record;
     };
-    std::pmr::vector<Made> _made;
+    std::vector<Made> _made;
 };
 
 } // namespace orvo

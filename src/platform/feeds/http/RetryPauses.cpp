@@ -11,6 +11,7 @@
 #include <cctype>
 #include <charconv>
 #include <chrono>
+#include <cmath>
 #include <utility>
 
 namespace orvo {
@@ -18,21 +19,32 @@ namespace orvo {
 namespace {
 
 constexpr const char* LockName = "lock";
+constexpr double Slack = 60; // seconds by which clocks may be set while a pause lasts
 
-double secondsSince(std::filesystem::file_time_type time) {
-    const auto now = std::filesystem::file_time_type::clock::now();
-    return std::chrono::duration<double>(now - time).count();
+/// The machine's, in seconds since 1970.
+double systemNow() {
+    return std::chrono::duration<double>(std::chrono::system_clock::now().time_since_epoch())
+        .count();
 }
 
-/// Takes pauses away that have long ended.
+/// Takes pauses away that have long ended, or were noted in a future that was none.
 void sweep(const std::filesystem::path& folder) {
+    const auto now = std::filesystem::file_time_type::clock::now();
     std::error_code error;
-    for (const auto& file : std::filesystem::directory_iterator(folder, error)) {
-        const auto written = file.last_write_time(error);
-        if (!error && file.path().filename() != LockName &&
-            secondsSince(written) > RetryPauses::Longest)
-            std::filesystem::remove(file.path(), error);
+    const std::filesystem::directory_iterator end;
+    for (std::filesystem::directory_iterator file(folder, error); !error && file != end;
+         file.increment(error)) {
+        std::error_code ignored;
+        const auto written = file->last_write_time(ignored);
+        const double age = std::chrono::duration<double>(now - written).count();
+        if (!ignored && file->path().filename() != LockName && std::abs(age) > RetryPauses::Longest)
+            std::filesystem::remove(file->path(), ignored);
     }
+}
+
+std::optional<double> number(const NSDictionary& entries, const char* key) {
+    const auto number = std::dynamic_pointer_cast<NSNumber>(entries.objectForKey(key));
+    return number ? std::optional(number->doubleValue()) : std::nullopt;
 }
 
 } // namespace
@@ -62,33 +74,38 @@ std::filesystem::path RetryPauses::path(const std::string& key) const {
 
 std::shared_ptr<NSError>
 RetryPauses::note(const std::string& key, double seconds, int status, double monotonicNow) {
-    std::shared_ptr<NSError> error;
-    if (!Environment::keepsWritesInMemory().get())
-        error = write(key, seconds, status);
-    const auto file = written(key);
+    const Kept pause{systemNow() + seconds, seconds, status};
+    {
+        const std::lock_guard lock(_mutex);
+        _ends[key] = {monotonicNow + seconds, status, pause.until};
+    }
+    return Environment::keepsWritesInMemory().get() ? nullptr : write(key, pause);
+}
+
+void RetryPauses::forget(const std::string& key) {
     const std::lock_guard lock(_mutex);
-    _ends[key] = {monotonicNow + seconds, status, file};
-    return error;
+    _ends.erase(key);
+    std::error_code ignored;
+    if (!Environment::keepsWritesInMemory().get())
+        std::filesystem::remove(path(key), ignored);
 }
 
 std::optional<RetryPauses::Pause> RetryPauses::pending(const std::string& key,
                                                        double monotonicNow) {
-    const auto file = written(key);
-    {
-        const std::lock_guard lock(_mutex);
-        const auto known = _ends.find(key);
-        if (known != _ends.end() && (known->second.written == file || !file)) {
-            const End& end = known->second;
-            if (end.at <= monotonicNow)
-                return std::nullopt;
-            return Pause{end.at - monotonicNow, end.status};
-        }
-    }
-    return file ? pauseOnDisk(key, *file) : std::nullopt;
+    const auto file = kept(key);
+    const std::lock_guard lock(_mutex);
+    const auto known = _ends.find(key);
+    const bool isNew = file && (known == _ends.end() || known->second.until != file->until);
+    const double left = isNew ? file->until - systemNow() : 0;
+    if (left > 0 && left <= file->seconds + Slack)
+        _ends[key] = {monotonicNow + std::min(left, file->seconds), file->status, file->until};
+    const auto end = _ends.find(key);
+    if (end == _ends.end() || end->second.at <= monotonicNow)
+        return std::nullopt;
+    return Pause{end->second.at - monotonicNow, end->second.status};
 }
 
-std::shared_ptr<NSError>
-RetryPauses::write(const std::string& key, double seconds, int status) const {
+std::shared_ptr<NSError> RetryPauses::write(const std::string& key, const Kept& pause) const {
     if (auto error = AtomicFile::makeFolder(_folder))
         return error;
     std::shared_ptr<NSError> error;
@@ -96,34 +113,28 @@ RetryPauses::write(const std::string& key, double seconds, int status) const {
     if (!lock)
         return error;
     sweep(_folder);
-    const auto list = PropertyList::write(
-        *NSDictionary::dictionaryWithTextKeys({{"seconds", NSNumber::numberWithDouble(seconds)},
-                                               {"status", NSNumber::numberWithInteger(status)}}),
-        &error);
+    const auto entries = NSDictionary::dictionaryWithTextKeys(
+        {{"until", NSNumber::numberWithDouble(pause.until)},
+         {"seconds", NSNumber::numberWithDouble(pause.seconds)},
+         {"status", NSNumber::numberWithInteger(pause.status)}});
+    const auto list = PropertyList::write(*entries, &error);
     return list ? AtomicFile::write(*lock, path(key), list->bytes()) : error;
 }
 
-std::optional<RetryPauses::FileTime> RetryPauses::written(const std::string& key) const {
-    std::error_code error;
-    const FileTime time = std::filesystem::last_write_time(path(key), error);
-    return error ? std::nullopt : std::optional(time);
-}
-
-std::optional<RetryPauses::Pause> RetryPauses::pauseOnDisk(const std::string& key,
-                                                           FileTime written) const {
+/// Nothing for a file that no program of ours can have written.
+std::optional<RetryPauses::Kept> RetryPauses::kept(const std::string& key) const {
     const auto bytes = AtomicFile::read(path(key));
     const auto list = bytes ? PropertyList::read(bytes->bytes()) : nullptr;
     const auto* const entries = dynamic_cast<const NSDictionary*>(list.get());
     if (!entries)
         return std::nullopt;
-    const auto seconds = std::dynamic_pointer_cast<NSNumber>(entries->objectForKey("seconds"));
-    const auto status = std::dynamic_pointer_cast<NSNumber>(entries->objectForKey("status"));
-    if (!seconds || !status || !(seconds->doubleValue() <= Longest))
+    const auto until = number(*entries, "until");
+    const auto seconds = number(*entries, "seconds");
+    const auto status = number(*entries, "status");
+    if (!until || !seconds || !status || !std::isfinite(*until) ||
+        !(*seconds >= 0 && *seconds <= Longest) || !(*status >= 100 && *status < 600))
         return std::nullopt;
-    const double left = seconds->doubleValue() - std::max(secondsSince(written), 0.0);
-    if (!(left > 0))
-        return std::nullopt;
-    return Pause{left, static_cast<int>(status->integerValue())};
+    return Kept{*until, *seconds, static_cast<int>(*status)};
 }
 
 } // namespace orvo

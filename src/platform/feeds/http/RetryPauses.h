@@ -19,9 +19,10 @@ namespace orvo {
 retryDelay(std::string_view retryAfter, std::string_view date, double now);
 
 /// The pauses that servers asked for, by the key of the request: kept in a folder that several
-/// processes share, so that a program that is started anew does not ask again. `KEY.plist` says how
-/// long a pause lasts from the time at which the file was written. Nobody else writes to the
-/// folder. While `Environment::keepsWritesInMemory()` holds, the folder is only read. Any thread.
+/// processes share, so that a program that is started anew does not ask again. `KEY.plist` says
+/// when a pause ends, by the machine's own clock: the environment's may stand in another year.
+/// Nobody else writes to the folder. While `Environment::keepsWritesInMemory()` holds, it is only
+/// read. Any thread.
 class RetryPauses {
 public:
     static constexpr double Longest = 24 * 3600; ///< seconds
@@ -40,25 +41,29 @@ public:
     /// @return nil, or why other processes will not know
     std::shared_ptr<NSError>
     note(const std::string& key, double seconds, int status, double monotonicNow);
-    /// Nothing when no pause is under way. A pause that was noted here ends by the monotonic clock,
-    /// one of another process by the file system's: should that clock have been turned back since,
-    /// the pause begins anew.
+    /// Ends the pause, of which the server wants no more.
+    void forget(const std::string& key);
+    /// Nothing when no pause is under way. What another process noted is heard once and then
+    /// counted down here; not when it would last longer than the server wanted, as it would after
+    /// the machine's clock was set back.
     [[nodiscard]] std::optional<Pause> pending(const std::string& key, double monotonicNow);
 
 private:
-    using FileTime = std::filesystem::file_time_type;
-
-    struct End {
-        double at = 0; // monotonic
+    /// As the file has it.
+    struct Kept {
+        double until = 0; ///< seconds since 1970
+        double seconds = 0;
         int status = 0;
-        std::optional<FileTime> written; ///< of its file
+    };
+    struct End {
+        double at = 0; ///< monotonic
+        int status = 0;
+        double until = 0; ///< as in the file by which it is known
     };
 
     [[nodiscard]] std::filesystem::path path(const std::string& key) const;
-    [[nodiscard]] std::shared_ptr<NSError>
-    write(const std::string& key, double seconds, int status) const;
-    [[nodiscard]] std::optional<FileTime> written(const std::string& key) const;
-    [[nodiscard]] std::optional<Pause> pauseOnDisk(const std::string& key, FileTime written) const;
+    [[nodiscard]] std::shared_ptr<NSError> write(const std::string& key, const Kept& pause) const;
+    [[nodiscard]] std::optional<Kept> kept(const std::string& key) const;
 
     std::filesystem::path _folder;
     std::mutex _mutex;

@@ -28,6 +28,8 @@ struct LoadOptions {
     int wholeAfterValidations = 20;
     /// Ask for the whole body whatever is known of it.
     bool unconditional = false;
+    /// Ask the server also in a pause that it asked for: a person wants to know.
+    bool inPause = false;
     /// Tells by the bytes alone whether none are missing, on a worker queue. It is asked about a
     /// body over HTTP whose end the server did not tell, neither by Content-Length nor by chunks
     /// nor by a compression with a checksum. Empty: no bytes can tell, and such a body is a failed
@@ -84,8 +86,8 @@ public:
 /// The last good body of each remote source is kept in `bodies` in the cache folder, with its
 /// validators and times; while `Environment::keepsWritesInMemory()` holds, what comes is kept in
 /// memory instead. Callers of one request share it while it is under way; requests run side by
-/// side. A server that sends Retry-After is left alone for that time (at most a day), by this
-/// loader.
+/// side. A server that sends Retry-After is left alone for that time (at most a day), by all
+/// loaders of that cache folder: its pauses are kept in `pauses` there.
 class SourceLoader {
 public:
     using Completion = std::function<void(SourceBody)>;

@@ -100,7 +100,7 @@ void _SourceLoad::begin() {
     }
     const auto pause =
         _ground->pauses().pending(_key, Environment::monotonicClock().get()->seconds());
-    if (pause)
+    if (pause && !_options.inPause)
         fail(sourceError(SourceErrorCode::RetryLater,
                          fmt::format("{}: the server asked to be left alone for {:.0f} seconds "
                                      "more ({})",
@@ -173,6 +173,8 @@ void _SourceLoad::fetch(bool mayBeConditional) {
 void _SourceLoad::fetched(HttpFetchResult result) {
     if (result.retryDelay)
         notePause(*result.retryDelay, result.status);
+    else if (!result.error && _options.inPause)
+        _ground->pauses().forget(_key);
     if (result.error)
         fail(std::move(result.error));
     else if (result.isNotModified)

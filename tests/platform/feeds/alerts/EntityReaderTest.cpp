@@ -5,6 +5,8 @@
 
 #include <gtest/gtest.h>
 
+#include <memory_resource>
+
 namespace orvo::testing {
 
 namespace {
@@ -13,11 +15,13 @@ namespace {
 struct Reading {
     std::string bytes;
     AlertStatistics statistics;
+    EntityReader reader;
     AlertReading reading;
 
     explicit Reading(const Wire& entity, const SelectorShapes* passedOver = nullptr)
         : bytes(entity.str())
-        , reading(EntityReader(statistics, passedOver).read(bytes)) {}
+        , reader(statistics, passedOver)
+        , reading(reader.read(bytes)) {}
     Reading(const Reading&) = delete;
     Reading& operator=(const Reading&) = delete;
     ~Reading() = default;
@@ -49,6 +53,27 @@ std::string routesOf(const AlertSelectors& selectors) {
 Wire ofAgency(std::string_view line) {
     return Wire().bytes(1, "A1").bytes(2, line);
 }
+
+/// Counts what is taken from it and not given back.
+class CountingResource final : public std::pmr::memory_resource {
+public:
+    [[nodiscard]] std::size_t live() const noexcept { return _live; }
+
+private:
+    void* do_allocate(std::size_t bytes, std::size_t alignment) override {
+        _live += bytes;
+        return std::pmr::new_delete_resource()->allocate(bytes, alignment);
+    }
+    void do_deallocate(void* block, std::size_t bytes, std::size_t alignment) override {
+        _live -= bytes;
+        std::pmr::new_delete_resource()->deallocate(block, bytes, alignment);
+    }
+    [[nodiscard]] bool do_is_equal(const memory_resource& other) const noexcept override {
+        return this == &other;
+    }
+
+    std::size_t _live = 0;
+};
 
 const std::string BadText = "caf\xE9";
 
@@ -142,6 +167,20 @@ TEST(EntityReader, ABadPeriodIsCountedAndLeavesOpenWhenTheAlertHolds) {
     EXPECT_EQ(read.alert().activePeriods.size(), 3U);
     EXPECT_EQ(read.count(AlertCount::UnreadablePeriods), 2U);
     EXPECT_FALSE(read.reading.mayConcernAnyLine);
+}
+
+TEST(EntityReader, BadPeriodsInARowLeaveItOpenNoMoreThanOne) {
+    AlertMaker maker;
+    maker.activePeriods = {period(1, 2)};
+    const Wire bad = Wire().number(1, 7);
+    maker.more = Wire().bytes(1, bad).number(1, 3).number(1, 3).number(1, 3);
+    const Reading read(maker.entity());
+    ASSERT_EQ(read.alert().activePeriods.size(), 3U);
+    EXPECT_EQ(read.alert().activePeriods[0].start, 1U);
+    EXPECT_EQ(read.alert().activePeriods[1].start, 7U);
+    EXPECT_EQ(read.alert().activePeriods[2].start, std::nullopt);
+    EXPECT_EQ(read.alert().activePeriods[2].end, std::nullopt);
+    EXPECT_EQ(read.count(AlertCount::UnreadablePeriods), 3U);
 }
 
 TEST(EntityReader, ABadTextCostsOnlyThatTranslation) {
@@ -410,6 +449,47 @@ TEST(EntityReader, ExtensionsAreSteppedOver) {
                            .entity());
     EXPECT_EQ(read.statistics.unreadable(), 0U);
     EXPECT_FALSE(read.reading.mayConcernAnyLine);
+}
+
+TEST(EntityReader, WhatWasReadBeforeTakesNoRoom) {
+    CountingResource counting;
+    std::pmr::memory_resource* const before = std::pmr::set_default_resource(&counting);
+    {
+        AlertMaker maker;
+        maker.activePeriods.assign(2000, period(1, 2));
+        const std::string bytes = maker.entity().str();
+        AlertStatistics statistics;
+        EntityReader reader(statistics);
+        std::size_t one = 0;
+        for (int i = 0; i < 100; ++i) {
+            EXPECT_EQ(reader.read(bytes).alert.value().activePeriods.size(), 2000U);
+            if (i == 0)
+                one = counting.live();
+        }
+        EXPECT_GT(one, 0U);
+        EXPECT_LE(counting.live(), one);
+    }
+    std::pmr::set_default_resource(before);
+    EXPECT_EQ(counting.live(), 0U);
+}
+
+TEST(EntityReader, ACopyOfAnAlertStaysWhenTheNextIsRead) {
+    AlertMaker maker;
+    maker.activePeriods = {period(1, 2), period(3, 4)};
+    const std::string one = maker.entity().str();
+    maker.activePeriods = {period(5, 6)};
+    const std::string other = maker.entity().str();
+    AlertStatistics statistics;
+    EntityReader reader(statistics);
+    const AlertReading first = reader.read(one);
+    const Alert kept(*first.alert, AlertRoom());
+    (void)reader.read(other);
+    ASSERT_EQ(kept.activePeriods.size(), 2U);
+    EXPECT_EQ(kept.activePeriods[1].start, 3U);
+    EXPECT_EQ(kept.id, "1");
+    EXPECT_EQ(kept.effect, 4);
+    EXPECT_EQ(kept.selectors.size(), maker.selectors.size());
+    EXPECT_EQ(kept.header.size(), maker.header.size());
 }
 
 TEST(EntityReader, TranslationsHaveALimit) {

@@ -135,6 +135,21 @@ TEST(IncidentBuilder, EachPeriodIsAnIncidentOfTheSameNumber) {
     EXPECT_EQ(seconds(incidents[0]->creationDate()), 1);
 }
 
+TEST(IncidentBuilder, RecordsOfOneIncidentShareWhatTheyHaveInCommon) {
+    const Answer result = answer({maker([](AlertMaker& m) {
+        m.activePeriods = {period(At - 100, At + 100), period(At + 1000, At + 2000)};
+        m.selectors = {route("R1"), route("R2").bytes(5, "S3")};
+    })});
+    const auto& whole = result.incidents("R1");
+    const auto& part = result.incidents("R2");
+    ASSERT_EQ(whole.size(), 2U);
+    ASSERT_EQ(part.size(), 2U);
+    EXPECT_NE(whole[0], whole[1]);
+    EXPECT_NE(whole[0], part[0]);
+    for (const auto& record : {whole[1], part[0], part[1]})
+        EXPECT_EQ(record->common(), whole[0]->common());
+}
+
 TEST(IncidentBuilder, UnitedAlertsConcernAllTheirLinesEachWithItsOwnPeriods) {
     const Answer result = answer({maker([](AlertMaker& m) {
                                       m.id = "1";

@@ -188,7 +188,7 @@ TEST(IncidentMerger, ThreeEntitiesOfThreeLanguagesUnderOneIdentifierAreOneIncide
         EntityReader reader(statistics);
         std::deque<Alert> alerts;
         for (const std::string_view entity : message->entities)
-            alerts.push_back(reader.read(entity).alert.value());
+            alerts.emplace_back(reader.read(entity).alert.value(), AlertRoom());
         EXPECT_EQ(alerts.size(), 6U);
         const auto incidents = merge(alerts, "nl");
         const auto preference = LanguagePreference::forPerson("fr-BE", "nl");

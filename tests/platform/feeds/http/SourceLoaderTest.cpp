@@ -280,6 +280,20 @@ TEST_F(SourceLoaderTest, AProgramThatIsStartedInThePauseAsksNobody) {
     EXPECT_EQ(network->asked().size(), asked);
 }
 
+TEST_F(SourceLoaderTest, APersonWhoWantsToKnowIsAnsweredInThePause) {
+    network->answer(503, {{"retry-after", "3600"}});
+    (void)load(*loader, request);
+    LoadOptions options;
+    options.inPause = true;
+    network->answer(503, {{"retry-after", "3600"}});
+    EXPECT_EQ(codeOf(load(*loader, request, options)), SourceErrorCode::Status);
+    EXPECT_EQ(network->asked().size(), 2U);
+    network->answer(200, {}, "body");
+    EXPECT_EQ(textOf(load(*loader, request, options)), "body");
+    network->answer(200, {}, "and again");
+    EXPECT_EQ(textOf(load(*loader, request)), "and again") << "the pause is over";
+}
+
 TEST_F(SourceLoaderTest, ThePauseIsThatRequestsOwn) {
     network->answer(503, {{"retry-after", "120"}});
     (void)load(*loader, request);
