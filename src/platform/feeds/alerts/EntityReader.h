@@ -73,7 +73,7 @@ private:
     AlertStatistics& _statistics;
     const SelectorShapes* _passedOver;
     // Large enough for the lists of most alerts.
-    std::array<std::byte, 16384> _firstRoom;
+    std::array<std::byte, 16384> _firstRoom{};
     std::pmr::monotonic_buffer_resource _room{_firstRoom.data(), _firstRoom.size()};
     // Of the entity being read.
     AlertSelectors _selectors;
