@@ -11,7 +11,8 @@ FeedLookup::Answer of(const std::vector<FeedConfiguration>& feeds, CommandContex
     auto schedules = context.schedules(answer.error);
     if (!schedules)
         return answer;
-    auto ground = FeedLookup::profileGround(true);
+    constexpr bool Insists = true; // a person asked for just this
+    auto ground = FeedLookup::profileGround(Insists);
     ground.feeds = [feeds](std::shared_ptr<NSError>*) {
         return feeds;
     };

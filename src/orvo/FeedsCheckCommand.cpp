@@ -73,8 +73,10 @@ bool hasFailed(const FeedStatistics& statistics) {
 CommandSpec FeedsCheckCommand::spec() const {
     return {.path = {"feeds", "check"},
             .summary = "Read the alerts now and say what they hold",
-            .description = "Counts what was read, what was left out and why, and names what the "
-                           "schedule does not know. Ends with 1 when a source could not be read.",
+            .description =
+                "Counts what was read, what was left out and why, and names what the "
+                "schedule does not know. A server is asked also where it wanted a pause. "
+                "Ends with 1 when a source could not be read.",
             .operands = {{.name = "NAME",
                           .help = "feeds; without it all",
                           .count = OperandSpec::Count::Any,
