@@ -39,10 +39,8 @@ std::shared_ptr<NSError> keep(const HandOff& handOff) {
     if (!bytes)
         return error;
     const auto path = keptPath();
-    if ((error = AtomicFile::makeFolder(path.parent_path())))
-        return error;
     auto lockPath = path;
-    const auto lock = FileLock::acquire(lockPath += ".lock", &error);
+    const auto lock = AtomicFile::lockMakingFolder(lockPath += ".lock", &error);
     return lock ? AtomicFile::write(*lock, path, bytes->bytes()) : error;
 }
 

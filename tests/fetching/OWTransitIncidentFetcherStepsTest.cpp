@@ -2,7 +2,10 @@
 #include "fetching/FetchingFakes.h"
 #include "fetching/OWTransitIncidentFetcher.h"
 #include "fetching/_OWTransitIncidentFetcherRequest.h"
+#include "platform/favorites/FavoritePlace.h"
+#include "platform/favorites/FavoriteTransitLine.h"
 #include "platform/favorites/FavoritesStore.h"
+#include "platform/foundation/Environment.h"
 #include "platform/foundation/Log.h"
 #include "platform/foundation/RunLoop.h"
 #include "shared/NSUserDefaults_OrvoGroup.h"
@@ -48,6 +51,11 @@ public:
         return _events;
     }
 
+    void clear() {
+        const std::lock_guard lock(_mutex);
+        _events.clear();
+    }
+
 private:
     mutable std::mutex _mutex;
     std::vector<std::string> _events;
@@ -72,12 +80,13 @@ public:
         const std::lock_guard lock(_mutex);
         return static_cast<bool>(_handler);
     }
-    void answer(const std::shared_ptr<NSArray>& items) {
+    void answer(const std::shared_ptr<NSArray>& items,
+                const std::shared_ptr<NSError>& error = nullptr) {
         std::unique_lock lock(_mutex);
         const auto handler = std::exchange(_handler, nullptr);
         lock.unlock();
         _events->note("the answer");
-        handler(items, nullptr);
+        handler(items, error);
     }
 
 private:
@@ -117,6 +126,13 @@ protected:
         ASSERT_TRUE(runUntil([&] { return lookup->isPending() || request->result(); }));
         if (lookup->isPending())
             lookup->answer(NSArray::array());
+    }
+    /// As if the container had given these. Nothing runs on another thread.
+    void fetchFavorites(NSArray::Elements favorites) const {
+        OWTransitIncidentFetcher::init()->_fetchIncidentsForFavorites_withRequest(
+            NSArray::arrayWithObjects(std::move(favorites)),
+            Request::initWithCompletionHandler(
+                [this](const auto&) { events->note("the handler"); }));
     }
     static void saveLine(std::uint64_t muid) {
         std::shared_ptr<NSError> error;
@@ -171,6 +187,65 @@ TEST_F(IncidentFetcherSteps, ComeInThisOrder) {
                             "Received 1 line items.",
                             "the fetch's handler",
                             "a joined handler"));
+}
+
+TEST_F(IncidentFetcherSteps, AnErrorIsToldToTheLogBeforeAnybodyElse) {
+    fetchFavorites({makeFavorite(7)});
+    lookup->answer(nullptr, NSError::errorWithMessage("TestDomain", 1, "no network"));
+    EXPECT_THAT(events->all(),
+                ElementsAre("Received 1 favorites from container.",
+                            "Issuing favorite lines lookup request for Muids: <private>.",
+                            "a ticket for 7",
+                            "its submission",
+                            "the answer",
+                            "Received error: <private>.",
+                            "the handler"));
+}
+
+TEST_F(IncidentFetcherSteps, WithoutLinesTheLogIsWrittenAtOnceAndTheHandlerComesLater) {
+    for (const auto& favorites :
+         {NSArray::array(),
+          NSArray::arrayOf({FavoritePlace::initWithName_latitude_longitude("Home", 1, 2)})}) {
+        events->clear();
+        const std::string count = std::to_string(favorites->count());
+        fetchFavorites(favorites->elements());
+        const std::vector<std::string> logged = {"Received " + count + " favorites from container.",
+                                                 "0 Favorite lines, returning early."};
+        EXPECT_EQ(events->all(), logged);
+        RunLoop::main().runOnce();
+        EXPECT_THAT(events->all(), ElementsAre(logged[0], logged[1], "the handler"));
+    }
+    EXPECT_FALSE(lookup->isPending());
+}
+
+TEST_F(IncidentFetcherSteps, WhetherIncidentsAreFakeIsAskedWhenTheAnswerHasCome) {
+    const auto random = Environment::random().overrideWith([this] {
+        events->note("a draw");
+        return 1U;
+    });
+    const auto defaults = OrvoGroup::__orvo_groupUserDefaults();
+    constexpr const char* Key = "Orvo.TransitWidget.internal.injectFakeIncidents";
+    fetchFavorites({makeFavorite(7)});
+    defaults->setBool_forKey(true, Key);
+    lookup->answer(NSArray::arrayOf({makeItem(7)}));
+    EXPECT_GT(std::ranges::count(events->all(), "a draw"), 0);
+
+    events->clear();
+    fetchFavorites({makeFavorite(7)});
+    defaults->setBool_forKey(false, Key);
+    lookup->answer(NSArray::arrayOf({makeItem(7)}));
+    EXPECT_EQ(std::ranges::count(events->all(), "a draw"), 0);
+}
+
+TEST_F(IncidentFetcherSteps, WhateverAdoptsTheProtocolIsAFavoriteLine) {
+    class OtherFavorite final : public FavoriteTransitLine {
+    public:
+        [[nodiscard]] std::shared_ptr<TransitLine> transitLine() const override {
+            return makeLine(9);
+        }
+    };
+    fetchFavorites({std::make_shared<OtherFavorite>()});
+    EXPECT_EQ(std::ranges::count(events->all(), "a ticket for 9"), 1);
 }
 
 TEST_F(IncidentFetcherSteps, ALookupKeepsFetcherAndRequestUntilItHasAnswered) {

@@ -240,10 +240,8 @@ std::shared_ptr<NSError> FeedRegistry::change(const Change& change) {
 }
 
 std::shared_ptr<NSError> FeedRegistry::changeFiles(const Change& change) {
-    if (auto error = AtomicFile::makeFolder(_folder))
-        return error;
     std::shared_ptr<NSError> error;
-    const auto lock = FileLock::acquire(_folder / LockName, &error);
+    const auto lock = AtomicFile::lockMakingFolder(_folder / LockName, &error);
     if (!lock)
         return error;
     auto stored = read(_folder);

@@ -9,6 +9,7 @@
 #include <sys/stat.h>
 #include <system_error>
 #include <unistd.h>
+#include <utility>
 
 namespace orvo::AtomicFile {
 
@@ -140,6 +141,16 @@ std::shared_ptr<NSError> makeFolder(const std::filesystem::path& path) {
         !(errno == EEXIST && std::filesystem::is_directory(path, reason)))
         return systemError(path, errno);
     return nullptr;
+}
+
+std::unique_ptr<FileLock> lockMakingFolder(const std::filesystem::path& path,
+                                           std::shared_ptr<NSError>* error) {
+    if (auto problem = makeFolder(path.parent_path())) {
+        if (error)
+            *error = std::move(problem);
+        return nullptr;
+    }
+    return FileLock::acquire(path, error);
 }
 
 } // namespace orvo::AtomicFile

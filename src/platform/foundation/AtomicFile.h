@@ -36,4 +36,8 @@ write(const FileLock& lock, const std::filesystem::path& path, std::span<const s
 /// Makes the folder (mode 0700) and those above it where they do not exist. Nil when it is there.
 [[nodiscard]] std::shared_ptr<NSError> makeFolder(const std::filesystem::path& path);
 
+/// `FileLock::acquire`, after the folder of the lock was made.
+[[nodiscard]] std::unique_ptr<FileLock> lockMakingFolder(const std::filesystem::path& path,
+                                                         std::shared_ptr<NSError>* error);
+
 } // namespace orvo::AtomicFile

@@ -111,6 +111,18 @@ TEST_F(AtomicFileTest, FoldersAreMadeForThePersonAlone) {
     EXPECT_EQ(error->code(), EEXIST);
 }
 
+TEST_F(AtomicFileTest, TheFolderOfALockIsMadeWhereItIsAsked) {
+    const auto deep = folder.path() / "a" / "b";
+    std::shared_ptr<NSError> error;
+    EXPECT_TRUE(AtomicFile::lockMakingFolder(deep / "lock", &error));
+    EXPECT_FALSE(error);
+    EXPECT_EQ(mode(deep), 0700U);
+    std::ofstream(folder.path() / "taken") << "";
+    EXPECT_FALSE(AtomicFile::lockMakingFolder(folder.path() / "taken" / "lock", &error));
+    ASSERT_TRUE(error);
+    EXPECT_EQ(error->code(), EEXIST);
+}
+
 TEST_F(AtomicFileTest, ALockThatCannotBeMadeIsAnError) {
     std::shared_ptr<NSError> error;
     EXPECT_FALSE(FileLock::acquire(folder.path() / "none" / "lock", &error));

@@ -112,10 +112,8 @@ std::shared_ptr<NSError> BodyStore::update(const std::string& key, const BodyRec
 
 std::shared_ptr<NSError>
 BodyStore::saveOnDisk(const std::string& key, const BodyRecord& record, const NSData& bytes) {
-    if (auto error = AtomicFile::makeFolder(_folder))
-        return error;
     std::shared_ptr<NSError> error;
-    const auto lock = FileLock::acquire(_folder / LockName, &error);
+    const auto lock = AtomicFile::lockMakingFolder(_folder / LockName, &error);
     if (!lock)
         return error;
     const auto list = PropertyList::write(*record.propertyList(), &error);

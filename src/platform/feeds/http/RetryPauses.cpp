@@ -106,10 +106,8 @@ std::optional<RetryPauses::Pause> RetryPauses::pending(const std::string& key,
 }
 
 std::shared_ptr<NSError> RetryPauses::write(const std::string& key, const Kept& pause) const {
-    if (auto error = AtomicFile::makeFolder(_folder))
-        return error;
     std::shared_ptr<NSError> error;
-    const auto lock = FileLock::acquire(_folder / LockName, &error);
+    const auto lock = AtomicFile::lockMakingFolder(_folder / LockName, &error);
     if (!lock)
         return error;
     sweep(_folder);
