@@ -11,6 +11,7 @@
 #include "platform/mapuikit/SizedTransitArtwork.h"
 #include "platform/mapuikit/TransitIncidentStringProvider.h"
 #include "platform/uikit/UIImage.h"
+#include "shared/OrvoMap.h"
 #include "viewmodel/TransitArtworkEquality.h"
 #include "viewmodel/WidgetTexts.h"
 
@@ -215,11 +216,13 @@ OWTransitIncidentsDataSourceBuilder::_userActivityDataForLineItem(
 
 std::shared_ptr<OWUserActivityData> OWTransitIncidentsDataSourceBuilder::_activityDataForIncidents(
     const std::vector<std::shared_ptr<TransitIncident>>& incidents) {
-    NSArray::Elements storage;
-    for (const auto& incident : incidents)
-        storage.push_back(TransitStorageIncident::initWithIncident(incident));
+    const auto storage =
+        OrvoMap(NSArray::arrayOf(incidents), [](const auto& incident, std::size_t) {
+            return TransitStorageIncident::initWithIncident(
+                std::dynamic_pointer_cast<TransitIncident>(incident));
+        });
     const auto archive = NSKeyedArchiver::archivedDataWithRootObject_requiringSecureCoding_error(
-        NSArray::arrayWithObjects(std::move(storage)), true, nullptr);
+        storage, true, nullptr);
     return activityWithPayload("com.zentu.Orvo.Transit.IncidentList", "incidentListKey", archive);
 }
 
